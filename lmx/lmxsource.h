@@ -1,0 +1,215 @@
+// Byte sources and character decoding.
+//
+// A c_read delivers the bytes of a memory block or a file. c_get_as_utf8 works
+// out the encoding from the first bytes and hands upward UTF-8 bytes with all
+// line ends folded to one newline, counting lines as it goes. Everything above
+// this layer sees int values: 0 to 255 for a byte, -1 for the end.
+//
+// The common path (plain ASCII in a UTF-8 document) is inline and takes bytes
+// straight from the source's buffer; only refills go through a virtual call.
+#ifndef LMX_LMXSOURCE_H
+#define LMX_LMXSOURCE_H
+
+#include <cstddef>
+#include <cstdint>
+#include <cstdio>
+#include <string>
+#include <vector>
+
+#include "lmxerror.h"
+
+namespace lmx {
+
+// Abstract byte source. Derived classes expose a window of buffered bytes and
+// refill it on demand.
+class c_read {
+public:
+    c_read() = default;
+    c_read(const c_read &) = delete;
+    c_read &operator=(const c_read &) = delete;
+
+    virtual bool is_open() const { return true; }
+    // One byte as 0 to 255, or -1 at the end.
+    int read() {
+        if (p_next != p_end)
+            return *p_next++;
+        return refill() ? *p_next++ : -1;
+    }
+    virtual const char *get_source_id() const { return nullptr; }
+    virtual void rewind() = 0;
+    virtual ~c_read() = default;
+
+    // Bulk access to the bytes already buffered, for the decoder's fast path.
+    const unsigned char *buffered_begin() const { return p_next; }
+    const unsigned char *buffered_end() const { return p_end; }
+    void consume_to(const unsigned char *ap_next) { p_next = ap_next; }
+
+protected:
+    // Makes at least one more byte available in [p_next, p_end); false at the end.
+    virtual bool refill() { return false; }
+    void set_window(const unsigned char *ap_begin, const unsigned char *ap_end) {
+        p_next = ap_begin;
+        p_end = ap_end;
+    }
+
+private:
+    const unsigned char *p_next = nullptr;
+    const unsigned char *p_end = nullptr;
+};
+
+// Reads a caller's memory block without copying it; the block must outlive it.
+class c_read_memory : public c_read {
+public:
+    c_read_memory(const char *ap_start, std::size_t a_length);
+    void rewind() override;
+    // An empty source id, as a memory block has no name.
+    const char *get_source_id() const override { return m_source_id.c_str(); }
+
+private:
+    std::string m_source_id;
+    const unsigned char *p_start;
+    const unsigned char *p_end_of_data;
+};
+
+// The same as c_read_memory over a string the caller keeps alive.
+class c_read_string : public c_read_memory {
+public:
+    explicit c_read_string(const std::string &ar_string)
+        : c_read_memory(ar_string.data(), ar_string.size()) {}
+};
+
+// Reads a file in blocks. The wide path is UTF-16 in a std::wstring.
+class c_read_file : public c_read {
+public:
+    static constexpr std::size_t k_block_size = 64 * 1024;
+
+    explicit c_read_file(const char *ap_file);
+    explicit c_read_file(const wchar_t *ap_file);
+    ~c_read_file() override;
+
+    bool is_open() const override { return p_file != nullptr; }
+    const char *get_source_id() const override { return m_source_id.c_str(); }
+    void rewind() override;
+
+protected:
+    bool refill() override;
+
+private:
+    void open(const char *ap_utf8_path);
+
+    std::string m_source_id;
+    std::FILE *p_file = nullptr;
+    std::vector<unsigned char> m_buffer;
+};
+
+// A stack of at most three pushed-back values.
+class c_unget_buffer {
+public:
+    void unget(int a_c) {
+        if (m_count < k_slots) // a deeper push never happens; refuse rather than overrun
+            m_slots[m_count++] = a_c;
+    }
+    int get() { return m_slots[--m_count]; }
+    bool empty() const { return m_count == 0; }
+    void clear() { m_count = 0; }
+
+private:
+    static constexpr int k_slots = 3;
+    int m_slots[k_slots] = {};
+    int m_count = 0;
+};
+
+enum e_encoding_mode {
+    mode_unresolved = 0,
+    mode_single_byte = 1, // ISO-8859-1 and US-ASCII alike
+    mode_utf8 = 2,
+    mode_utf16_be = 3,
+    mode_utf16_le = 4,
+    mode_ucs2_be = 5,
+    mode_ucs2_le = 6
+};
+
+// Encodes one code point into a buffer of at least 5 bytes, NUL-terminated.
+char *unicode_char_to_utf8(std::uint32_t a_c, char *ap_buffer);
+// Decodes the 1 to 4 byte sequence at ap_sequence; false if it is malformed
+// (an invalid lead byte also sets the value to -1).
+bool utf8_to_unicode_char(const char *ap_sequence, std::int32_t *ap_value);
+// Checks the lead byte and the byte after it.
+bool is_valid_utf8_char_sequence(const char *ap_sequence);
+
+// Decodes a c_read into UTF-8 with folded line ends and a line count.
+class c_get_as_utf8 {
+public:
+    c_get_as_utf8(c_read &ar_reader, c_error &ar_error);
+    c_get_as_utf8(const c_get_as_utf8 &) = delete;
+    c_get_as_utf8 &operator=(const c_get_as_utf8 &) = delete;
+    virtual ~c_get_as_utf8() = default;
+
+    // Next UTF-8 byte with CR LF, CR, NEL and LINE SEPARATOR folded to "\n".
+    int get() {
+        int v = p_get();
+        if (v == '\n' && m_prev == '\r')
+            v = p_get();
+        m_prev = static_cast<char>(v);
+        if (v == '\r')
+            v = '\n';
+        if (v == '\n')
+            ++m_line;
+        return v;
+    }
+    void unget(int a_returned) { m_unget.unget(a_returned); }
+    void rewind();
+    int get_line_num() const { return m_line; }
+    const char *get_source_id() const { return ar_reader.get_source_id(); }
+    // Applies the encoding named in the XML declaration.
+    bool set_encoding(const char *ap_encoding);
+
+    void error(elmx_error_type a_type, elmx_error a_code, const char *ap_format);
+    void error(elmx_error_type a_type, elmx_error a_code, const std::string &ar_s);
+
+    c_error &get_error_record() const { return ar_error; }
+    e_encoding_mode get_encoding_mode() const { return m_mode; }
+
+protected:
+    // Appends to ar_out the longest run of buffered bytes for which
+    // ap_stop[byte] is zero, as get() would deliver them, and returns its length.
+    // Takes nothing unless the stream is in its plain UTF-8 state. Stop tables
+    // must stop at bytes of 0x80 and above, NUL and carriage return.
+    std::size_t take_raw_run(const unsigned char *ap_stop, std::string &ar_out);
+
+private:
+    int p_get() {
+        if (ar_error.is_fatal_errored())
+            return -1;
+        if (!m_unget.empty())
+            return m_unget.get();
+        if (p_pending)
+            return p_get_pending();
+        int c = ar_reader.read();
+        if (m_mode == mode_utf8 && c > 0 && c < 0x80)
+            return c;
+        return p_decode(c);
+    }
+    int p_get_pending();
+    int p_decode(int a_c);
+    int p_resolve_initial_character_encoding(int a_c);
+    int p_read_utf8_compound_char_sequence(int a_lead);
+    int p_complete_unit(int a_first, bool a_big_endian);
+    int p_read_utf16_unit(bool a_big_endian);
+    int p_map_unicode_to_utf8(std::uint32_t a_code_point);
+    int p_fail_encoding();
+
+    c_read &ar_reader;
+    c_error &ar_error;
+    c_getter_error_binder m_binder;
+    e_encoding_mode m_mode = mode_unresolved;
+    char m_prev = 0;
+    c_unget_buffer m_unget;
+    char m_sequence[8] = {};
+    const char *p_pending = nullptr;
+    std::int32_t m_line = 1;
+};
+
+} // namespace lmx
+
+#endif
