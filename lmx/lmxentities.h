@@ -246,6 +246,14 @@ protected:
     // whitespace mode, stopping where ap_stop says or at anything that needs
     // the careful path. Returns the number of bytes taken.
     std::size_t take_text_run(const unsigned char *ap_stop, std::string *ap_value);
+    void skip_white_run() {
+        if (m_entity_stack.empty())
+            skip_raw_white();
+    }
+    std::size_t take_name_run(const unsigned char *ap_stop, std::string *ap_name) {
+        return m_entity_stack.empty() ? take_raw_run(ap_stop, *ap_name) : 0;
+    }
+    int peek_plain_input() const { return m_entity_stack.empty() ? peek_plain() : -1; }
 
     const bool a_is_reading_xsd;
     bool pending_whitespace = false;

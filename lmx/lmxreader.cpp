@@ -136,7 +136,6 @@ int c_xml_reader::get_element_event(elmx_error *ap_error, std::string *ap_name) 
             break;
         case xe_name:
             p_crack(*ap_name, ea_element);
-            m_start_tag_name = *ap_name;
             break;
         default:
             break;
@@ -236,9 +235,9 @@ bool c_xml_reader::is_element_end_tag() {
 elmx_error c_xml_reader::ignore_element(const s_event_map *ac_event_map) {
     bool is_skipped = true;
     if (m_current_event == xe_start_tag_end)
-        is_skipped = skip_element_body(m_start_tag_name);
+        is_skipped = skip_element_body(m_name);
     else if (m_current_event != xe_end_tag) // the start tag is still open
-        is_skipped = skip_rest_of_element(m_start_tag_name);
+        is_skipped = skip_rest_of_element(m_name);
     if (!is_skipped)
         return elmx_xml_badly_formed;
     elmx_error error;

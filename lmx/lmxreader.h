@@ -265,7 +265,6 @@ private:
     s_code_location m_code_location;
     std::string m_name;
     std::string m_value;
-    std::string m_start_tag_name; // the name of the last start tag met
     std::string m_end_tag_name;
 };
 

@@ -9,12 +9,10 @@ const std::string c_xml::k_namespace_not_found(" ");
 
 namespace {
 
-bool is_ascii_letter(int a_c) { return (a_c >= 'a' && a_c <= 'z') || (a_c >= 'A' && a_c <= 'Z'); }
-
 std::string describe(int a_c) { return a_c == -1 ? std::string("end of input") : std::string(1, static_cast<char>(a_c)); }
 
 // Stop tables for the bulk paths: a byte whose entry is 1 needs the careful
-// path. Every table stops at NUL, carriage return and bytes of 0x80 and up.
+// path. Every table stops at NUL, line ends and bytes of 0x80 and up.
 struct s_stop_tables {
     unsigned char text[256];       // character data: "<", "&"
     unsigned char text_white[256]; // character data where white space is folded
@@ -24,7 +22,7 @@ struct s_stop_tables {
 
     s_stop_tables() : text(), text_white(), name(), double_quoted(), single_quoted() {
         for (int c = 0; c < 256; ++c) {
-            bool careful = c == 0 || c == '\r' || c >= 0x80;
+            bool careful = c == 0 || c == '\r' || c == '\n' || c >= 0x80;
             text[c] = careful || c == '<' || c == '&';
             text_white[c] = text[c] || is_white(c);
             name[c] = careful || !is_xml_name_char(c);
@@ -38,13 +36,6 @@ const s_stop_tables k_stop;
 
 } // namespace
 
-bool is_xml_name_start_char(int a_c) { return a_c > 127 || is_ascii_letter(a_c) || a_c == '_' || a_c == ':'; }
-
-bool is_xml_name_char(int a_c) {
-    return is_xml_name_start_char(a_c) || (a_c >= '0' && a_c <= '9') || a_c == '.' || a_c == '-';
-}
-
-bool is_xml_NCname_char(int a_c) { return a_c != ':' && is_xml_name_char(a_c); }
 
 c_xml::c_xml(c_read &ar_reader, c_error &ar_error, bool a_is_reading_xsd)
     : c_get_for_xml(ar_reader, ar_error, a_is_reading_xsd), m_dtd(*this) {}
@@ -133,7 +124,12 @@ elxp_xml_event c_xml::p_handle_lt(c_xml_local *ap_local_control, std::string *ap
 bool c_xml::p_read_name(int a_first, std::string *ap_name) {
     ap_name->push_back(static_cast<char>(a_first));
     for (;;) {
-        take_raw_run(k_stop.name, *ap_name);
+        take_name_run(k_stop.name, ap_name);
+        // A plain terminator can stay where it is; reading and pushing it
+        // back would change nothing.
+        int next = peek_plain_input();
+        if (next != -1 && !is_xml_name_char(next))
+            return true;
         int c = get();
         if (!is_xml_name_char(c)) {
             unget(c);
@@ -294,11 +290,12 @@ bool c_xml::p_capture_attributes(c_xml_local *ap_local_control) {
                 !p_register_namespace(ap_local_control, prefix, value_index))
                 return false;
         } else {
-            while (is_xml_name_char(c)) {
-                name.push_back(static_cast<char>(c));
-                c = get();
+            if (is_xml_name_char(c)) {
+                unget(c);
+                p_read_name(get(), &name);
+            } else {
+                unget(c);
             }
-            unget(c);
             m_attributes.append(name);
             m_attributes.mark_segment_end();
             std::size_t value_index;
@@ -326,7 +323,7 @@ bool c_xml::p_capture_attribute_value(c_attribute_data *ap_data, std::size_t *ap
         const unsigned char *p_stop = quote == '"' ? k_stop.double_quoted : k_stop.single_quoted;
         std::string &bytes = ap_data->bytes();
         for (;;) {
-            take_raw_run(p_stop, bytes);
+            take_name_run(p_stop, &bytes);
             c = get();
             if (c == quote) {
                 ap_data->mark_segment_end();

@@ -31,9 +31,13 @@ enum elxp_xml_event {
 
 // Name characters, by byte. Anything above 127 counts, so every byte of a
 // multi-byte UTF-8 character is a name character.
-bool is_xml_name_start_char(int a_c);
-bool is_xml_name_char(int a_c);
-bool is_xml_NCname_char(int a_c);
+inline bool is_xml_name_start_char(int a_c) {
+    return a_c > 127 || (a_c >= 'a' && a_c <= 'z') || (a_c >= 'A' && a_c <= 'Z') || a_c == '_' || a_c == ':';
+}
+inline bool is_xml_name_char(int a_c) {
+    return is_xml_name_start_char(a_c) || (a_c >= '0' && a_c <= '9') || a_c == '.' || a_c == '-';
+}
+inline bool is_xml_NCname_char(int a_c) { return a_c != ':' && is_xml_name_char(a_c); }
 
 class c_xml : public c_get_for_xml {
 public:

@@ -174,10 +174,24 @@ protected:
     // Appends to ar_out the longest run of buffered bytes for which
     // ap_stop[byte] is zero, as get() would deliver them, and returns its length.
     // Takes nothing unless the stream is in its plain UTF-8 state. Stop tables
-    // must stop at bytes of 0x80 and above, NUL and carriage return.
+    // must stop at bytes of 0x80 and above, NUL and both line end characters,
+    // which need the careful path for folding and counting.
     std::size_t take_raw_run(const unsigned char *ap_stop, std::string &ar_out);
+    // Passes over buffered blanks, tabs and line feeds, as get() would.
+    void skip_raw_white();
+    // The next buffered byte if it is plain ASCII that get() would hand up
+    // unchanged (no line end, no NUL), without taking it; otherwise -1.
+    int peek_plain() const {
+        if (!p_is_plain_state() || ar_reader.buffered_begin() == ar_reader.buffered_end())
+            return -1;
+        int c = *ar_reader.buffered_begin();
+        return (c == 0 || c == '\r' || c == '\n' || c >= 0x80) ? -1 : c;
+    }
 
 private:
+    bool p_is_plain_state() const {
+        return m_mode == mode_utf8 && m_unget.empty() && !p_pending && m_prev != '\r' && !ar_error.is_fatal_errored();
+    }
     int p_get() {
         if (ar_error.is_fatal_errored())
             return -1;

@@ -17,6 +17,7 @@ public:
 
     // The next value that is not white space; -1 stops it.
     int get_non_ws() {
+        skip_white_run();
         int c;
         do
             c = get();
