@@ -79,7 +79,15 @@ public:
         }
         return false;
     }
-    bool get(const std::string &ar_key, T *ap_out) const { return get(ar_key.c_str(), ap_out); }
+    bool get(const std::string &ar_key, T *ap_out) const {
+        for (const entry &e : m_entries) {
+            if (e.first == ar_key) {
+                *ap_out = Ops::get(e.second);
+                return true;
+            }
+        }
+        return false;
+    }
     bool is_defined(const char *ap_key) const {
         T ignored;
         return get(ap_key, &ignored);

@@ -82,9 +82,11 @@ elxp_xml_event c_xml::get_element_name(c_xml_local *ap_local_control, std::strin
 }
 
 elxp_xml_event c_xml::p_handle_lt(c_xml_local *ap_local_control, std::string *ap_name, bool *ap_again) {
-    int c = get();
+    // A plain first character of a name is taken with the rest of the name.
+    int next = peek_plain_input();
+    int c = next != -1 && is_xml_name_start_char(next) ? next : get();
     if (is_xml_name_start_char(c)) {
-        if (!p_read_name(c, ap_name)) {
+        if (!(c == next ? p_read_name_tail(ap_name) : p_read_name(c, ap_name))) {
             p_bad_well_formed("XML not Well-Formed");
             return xe_fatal;
         }
@@ -123,6 +125,11 @@ elxp_xml_event c_xml::p_handle_lt(c_xml_local *ap_local_control, std::string *ap
 // is pushed back. False at the end of input.
 bool c_xml::p_read_name(int a_first, std::string *ap_name) {
     ap_name->push_back(static_cast<char>(a_first));
+    return p_read_name_tail(ap_name);
+}
+
+// Reads on to the end of a name.
+bool c_xml::p_read_name_tail(std::string *ap_name) {
     for (;;) {
         take_name_run(k_stop.name, ap_name);
         // A plain terminator can stay where it is; reading and pushing it
@@ -257,15 +264,24 @@ bool c_xml::p_read_cdata(std::string *ap_value) {
 bool c_xml::p_capture_attributes(c_xml_local *ap_local_control) {
     m_attributes.clear();
     m_ns_attributes.clear();
+    std::string &name = m_scratch;
     for (;;) {
+        name.clear();
+        skip_white_run();
+        // A plain name that cannot be a namespace declaration is taken whole.
+        int next = peek_plain_input();
+        if (next != -1 && next != 'x' && is_xml_name_start_char(next)) {
+            p_read_name_tail(&name); // the end of input is reported with the value
+            if (!p_capture_ordinary_attribute(name))
+                return false;
+            continue;
+        }
         int c = get_non_ws();
         if (!is_xml_name_start_char(c)) {
             unget(c);
             m_attributes.mark_segment_end();
             return c != -1;
         }
-        std::string &name = m_scratch;
-        name.clear();
         static const char k_xmlns[] = "xmlns";
         int matched = 0;
         while (matched < 5 && c == k_xmlns[matched]) {
@@ -289,20 +305,22 @@ bool c_xml::p_capture_attributes(c_xml_local *ap_local_control) {
             if (!p_capture_attribute_value(&m_ns_attributes, &value_index) ||
                 !p_register_namespace(ap_local_control, prefix, value_index))
                 return false;
-        } else {
-            if (is_xml_name_char(c)) {
-                unget(c);
-                p_read_name(get(), &name);
-            } else {
-                unget(c);
-            }
-            m_attributes.append(name);
-            m_attributes.mark_segment_end();
-            std::size_t value_index;
-            if (!p_capture_attribute_value(&m_attributes, &value_index))
-                return false;
+            continue;
         }
+        if (is_xml_name_char(c))
+            p_read_name(c, &name);
+        else
+            unget(c);
+        if (!p_capture_ordinary_attribute(name))
+            return false;
     }
+}
+
+bool c_xml::p_capture_ordinary_attribute(const std::string &ar_name) {
+    m_attributes.append(ar_name);
+    m_attributes.mark_segment_end();
+    std::size_t value_index;
+    return p_capture_attribute_value(&m_attributes, &value_index);
 }
 
 bool c_xml::p_capture_attribute_value(c_attribute_data *ap_data, std::size_t *ap_value_index) {
@@ -366,8 +384,9 @@ bool c_xml::p_register_namespace(c_xml_local *ap_local_control, const std::strin
 
 elxp_xml_event c_xml::get_attribute_name(std::string *ap_name, bool a_in_xml_decl) {
     if (!m_attributes.is_eof()) {
-        ap_name->assign(m_attributes.get_str());
+        const char *p_name = m_attributes.get_str();
         m_attributes.next_segment();
+        ap_name->assign(p_name, std::strlen(p_name));
         return xe_name;
     }
     int c = get_non_ws();

@@ -116,6 +116,8 @@ private:
     elxp_xml_event p_get_xml_text(std::string *ap_name);
     bool p_read_cdata(std::string *ap_value);
     bool p_read_name(int a_first, std::string *ap_name);
+    bool p_read_name_tail(std::string *ap_name);
+    bool p_capture_ordinary_attribute(const std::string &ar_name);
     bool p_capture_attributes(c_xml_local *ap_local_control);
     bool p_capture_attribute_value(c_attribute_data *ap_data, std::size_t *ap_value_index);
     bool p_register_namespace(c_xml_local *ap_local_control, const std::string &ar_prefix,

@@ -361,41 +361,4 @@ bool c_get_as_utf8::set_encoding(const char *ap_encoding) {
     return accepted;
 }
 
-std::size_t c_get_as_utf8::take_raw_run(const unsigned char *ap_stop, std::string &ar_out) {
-    if (!p_is_plain_state())
-        return 0;
-    const unsigned char *begin = ar_reader.buffered_begin();
-    const unsigned char *end = ar_reader.buffered_end();
-    const unsigned char *p = begin;
-    while (end - p >= 8 && !(ap_stop[p[0]] | ap_stop[p[1]] | ap_stop[p[2]] | ap_stop[p[3]] | ap_stop[p[4]] |
-                             ap_stop[p[5]] | ap_stop[p[6]] | ap_stop[p[7]]))
-        p += 8;
-    while (p != end && !ap_stop[*p])
-        ++p;
-    if (p == begin)
-        return 0;
-    std::size_t length = static_cast<std::size_t>(p - begin);
-    ar_out.append(reinterpret_cast<const char *>(begin), length);
-    m_prev = static_cast<char>(p[-1]);
-    ar_reader.consume_to(p);
-    return length;
-}
-
-void c_get_as_utf8::skip_raw_white() {
-    const unsigned char *begin = ar_reader.buffered_begin();
-    const unsigned char *end = ar_reader.buffered_end();
-    auto is_plain_white = [](unsigned char c) { return c == ' ' || c == '\t' || c == '\n'; };
-    if (begin == end || !is_plain_white(*begin) || !p_is_plain_state())
-        return;
-    const unsigned char *p = begin;
-    std::int32_t lines = 0;
-    do {
-        lines += *p == '\n';
-        ++p;
-    } while (p != end && is_plain_white(*p));
-    m_line += lines;
-    m_prev = static_cast<char>(p[-1]);
-    ar_reader.consume_to(p);
-}
-
 } // namespace lmx
