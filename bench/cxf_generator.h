@@ -36,7 +36,8 @@ inline bool write_cxf3_document(const std::string &ar_path, int a_objects, unsig
         out += std::to_string(i);
         out += "\" Id=\"o";
         out += std::to_string(i);
-        out += "\">\n\t\t\t\t<cc:ColorValues>\n"
+        out += "\">\n\t\t\t\t<cc:CreationDate>2026-11-23T12:00:00</cc:CreationDate>\n"
+               "\t\t\t\t<cc:ColorValues>\n"
                "\t\t\t\t\t<cc:ReflectanceSpectrum ColorSpecification=\"cs1\" StartWL=\"380\">";
         for (int w = 0; w < 36; ++w) {
             std::snprintf(number, sizeof number, w ? " %.4f" : "%.4f", reflectance(random));
@@ -65,16 +66,18 @@ inline bool write_cxf3_document(const std::string &ar_path, int a_objects, unsig
            "\t\t\t\t<cc:TristimulusSpec>\n"
            "\t\t\t\t\t<cc:Illuminant>D50</cc:Illuminant>\n"
            "\t\t\t\t\t<cc:Observer>2_Degree</cc:Observer>\n"
-           "\t\t\t\t\t<cc:Method>E308</cc:Method>\n"
+           "\t\t\t\t\t<cc:Method>E308_Table5</cc:Method>\n"
            "\t\t\t\t</cc:TristimulusSpec>\n"
            "\t\t\t\t<cc:MeasurementSpec>\n"
            "\t\t\t\t\t<cc:MeasurementType>Spectrum_Reflectance</cc:MeasurementType>\n"
            "\t\t\t\t\t<cc:GeometryChoice>\n"
            "\t\t\t\t\t\t<cc:SingleAngle>\n"
+           "\t\t\t\t\t\t\t<cc:SingleAngleConfiguration>Annular</cc:SingleAngleConfiguration>\n"
            "\t\t\t\t\t\t\t<cc:IlluminationAngle>45</cc:IlluminationAngle>\n"
            "\t\t\t\t\t\t\t<cc:MeasurementAngle>0</cc:MeasurementAngle>\n"
            "\t\t\t\t\t\t</cc:SingleAngle>\n"
            "\t\t\t\t\t</cc:GeometryChoice>\n"
+           "\t\t\t\t\t<cc:WavelengthRange StartWL=\"380\" Increment=\"10\"/>\n"
            "\t\t\t\t</cc:MeasurementSpec>\n"
            "\t\t\t</cc:ColorSpecification>\n"
            "\t\t</cc:ColorSpecificationCollection>\n"

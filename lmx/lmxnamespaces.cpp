@@ -104,25 +104,10 @@ void c_xml_local::extract_namespace_context(c_namespace_context *ap_namespace_co
     }
 }
 
-namespace {
-
-// Copies bytes into a string that usually has the room already, without the
-// general replace machinery.
-void copy_bytes(std::string *ap_to, const char *ap_from, std::size_t a_length) {
-    if (a_length <= ap_to->capacity() && a_length <= ap_to->size()) {
-        std::memcpy(&(*ap_to)[0], ap_from, a_length);
-        ap_to->resize(a_length);
-    } else {
-        ap_to->assign(ap_from, a_length);
-    }
-}
-
-} // namespace
-
 void c_cracked_name::p_split(const std::string &ar_name) {
     const char *p_name = ar_name.data();
     const std::size_t length = ar_name.size();
-    copy_bytes(&m_full_name, p_name, length);
+    m_full_name.assign(p_name, length);
     const char *p_colon = static_cast<const char *>(std::memchr(p_name, ':', length));
     m_has_prefix = p_colon != nullptr;
     if (m_has_prefix) {
@@ -130,10 +115,9 @@ void c_cracked_name::p_split(const std::string &ar_name) {
         // Documents use one or two prefixes throughout: most names keep it.
         if (m_prefix.size() != prefix_length || std::memcmp(m_prefix.data(), p_name, prefix_length) != 0)
             m_prefix.assign(p_name, prefix_length);
-        copy_bytes(&m_local_name, p_colon + 1, length - prefix_length - 1);
+        m_local_name.assign(p_colon + 1, length - prefix_length - 1);
     } else {
         m_prefix.clear();
-        copy_bytes(&m_local_name, p_name, length);
     }
 }
 

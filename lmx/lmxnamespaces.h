@@ -118,7 +118,8 @@ public:
     int get_ns_id() const { return m_ns_id; }
     // The id of an element name: 1 for an unprefixed name that found nothing.
     int get_element_ns_id() const { return (m_ns_id == ns_not_found && !m_has_prefix) ? ns_none : m_ns_id; }
-    const std::string &get_local_name() const { return m_local_name; }
+    // An unprefixed name is its own local name; it is not copied twice.
+    const std::string &get_local_name() const { return m_has_prefix ? m_local_name : m_full_name; }
     const std::string &get_prefix() const { return m_prefix; }
     void set_ns_id(int a_id) { m_ns_id = a_id; }
 
