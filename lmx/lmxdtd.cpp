@@ -178,21 +178,6 @@ bool c_internal_dtd::p_read_dtd_entity() {
     return p_skip_to_end_of_markupdecl() && is_read;
 }
 
-bool c_internal_dtd::p_skip_to_end_of_markupdecl() {
-    int quote = 0;
-    for (;;) {
-        int c = get();
-        if (c == -1)
-            return false;
-        if (quote) {
-            if (c == quote)
-                quote = 0;
-        } else if (c == '"' || c == '\'') {
-            quote = c;
-        } else if (c == '>') {
-            return true;
-        }
-    }
-}
+bool c_internal_dtd::p_skip_to_end_of_markupdecl() { return getter().skip_to_tag_char(false) != -1; }
 
 } // namespace lmx

@@ -253,16 +253,12 @@ bool c_xml_reader::get_end_tag(const s_event_map *ac_event_map, const std::strin
     elmx_error error;
     *ap_event = ac_event_map ? get_element_event(ac_event_map, &error, &m_end_tag_name)
                              : get_element_event(&error, &m_end_tag_name);
-    const char *p_file = m_code_location.p_prog_file;
-    int line = m_code_location.prog_line;
     if (*ap_event == xe_end_of_input) {
-        *ap_error = handle_error(elmx_unexpected_end_of_message, ar_name, p_file, line);
+        p_stops(elmx_unexpected_end_of_message, ar_name, ap_error);
         return false;
     }
-    if (*ap_event != xe_end_tag || m_end_tag_name != ar_name) {
-        *ap_error = handle_error(elmx_bad_end_of_element, ar_name, p_file, line);
-        return *ap_error == elmx_ok;
-    }
+    if (*ap_event != xe_end_tag || m_end_tag_name != ar_name)
+        return !p_stops(elmx_bad_end_of_element, ar_name, ap_error);
     *ap_error = elmx_ok;
     return true;
 }
@@ -296,47 +292,40 @@ bool c_xml_reader::p_finish_start_tag(bool *ap_is_empty_element) {
     return skip_start_tag(ap_is_empty_element);
 }
 
+// Reports a failed step of reading ar_name; true when the handler let the
+// error stand and the caller must stop.
+bool c_xml_reader::p_stops(elmx_error a_error, const std::string &ar_name, elmx_error *ap_error) {
+    *ap_error = handle_error(a_error, ar_name, m_code_location.p_prog_file, m_code_location.prog_line);
+    return *ap_error != elmx_ok;
+}
+
 bool c_xml_reader::get_simple_type_value(const std::string &ar_name, elmx_whitespace a_ws_mode,
                                          std::string *ap_value, elmx_error *ap_error, bool *ap_is_empty_element) {
     *ap_error = elmx_ok;
     ap_value->clear();
-    if (!p_finish_start_tag(ap_is_empty_element) &&
-        (*ap_error = handle_error(elmx_bad_start_tag_end, ar_name, m_code_location.p_prog_file,
-                                  m_code_location.prog_line)) != elmx_ok)
+    if (!p_finish_start_tag(ap_is_empty_element) && p_stops(elmx_bad_start_tag_end, ar_name, ap_error))
         return false;
     if (*ap_is_empty_element)
         return true;
     if (!c_xml::get_element_value(ap_value, a_ws_mode, true) &&
-        (*ap_error = handle_error(elmx_unable_to_read_element, ar_name, m_code_location.p_prog_file,
-                                  m_code_location.prog_line)) != elmx_ok)
+        p_stops(elmx_unable_to_read_element, ar_name, ap_error))
         return false;
     bool is_end = c_xml::is_element_end_tag(ar_name);
     m_current_event = xe_end_tag;
-    if (!is_end && (*ap_error = handle_error(elmx_bad_end_of_element, ar_name, m_code_location.p_prog_file,
-                                             m_code_location.prog_line)) != elmx_ok)
-        return false;
-    return true;
+    return is_end || !p_stops(elmx_bad_end_of_element, ar_name, ap_error);
 }
 
 bool c_xml_reader::get_element_ur_value(const std::string &ar_name, std::string *ap_value, elmx_error *ap_error,
                                         bool *ap_is_empty_element) {
     *ap_error = elmx_ok;
     ap_value->clear();
-    if (!p_finish_start_tag(ap_is_empty_element) &&
-        (*ap_error = handle_error(elmx_bad_start_tag_end, ar_name, m_code_location.p_prog_file,
-                                  m_code_location.prog_line)) != elmx_ok)
+    if (!p_finish_start_tag(ap_is_empty_element) && p_stops(elmx_bad_start_tag_end, ar_name, ap_error))
         return false;
     if (*ap_is_empty_element)
         return true;
-    bool is_read = get_nested_element_value(ap_value, &m_end_tag_name, ws_preserve, false);
-    if (!is_read && (*ap_error = handle_error(elmx_unable_to_read_element, ar_name, m_code_location.p_prog_file,
-                                              m_code_location.prog_line)) != elmx_ok)
-        return false;
-    if (is_read && m_end_tag_name != ar_name &&
-        (*ap_error = handle_error(elmx_bad_end_of_element, ar_name, m_code_location.p_prog_file,
-                                  m_code_location.prog_line)) != elmx_ok)
-        return false;
-    return true;
+    if (!get_nested_element_value(ap_value, &m_end_tag_name, ws_preserve, false))
+        return !p_stops(elmx_unable_to_read_element, ar_name, ap_error);
+    return m_end_tag_name == ar_name || !p_stops(elmx_bad_end_of_element, ar_name, ap_error);
 }
 
 } // namespace lmx

@@ -251,6 +251,7 @@ public:
 private:
     void p_crack(const std::string &ar_name, elxp_attr_elem a_type);
     bool p_finish_start_tag(bool *ap_is_empty_element);
+    bool p_stops(elmx_error a_error, const std::string &ar_name, elmx_error *ap_error);
     bool p_is_known_element() const;
 
     c_xml_reader_local *p_current_scope = nullptr;

@@ -614,30 +614,20 @@ bool c_xml::p_get_any_element(const std::string &ar_name, std::string *ap_value,
 }
 
 bool c_xml::p_copy_rest_of_start_tag(std::string *ap_value, bool *ap_is_empty) {
-    int quote = 0;
-    for (;;) {
-        int c = get();
+    int c = skip_to_tag_char(true, ap_value);
+    if (c == '>') {
+        ap_value->push_back('>');
+        *ap_is_empty = false;
+        return true;
+    }
+    while (c != '>') {
         if (c == -1)
             return false;
-        if (quote) {
-            if (c == quote)
-                quote = 0;
-        } else if (c == '"' || c == '\'') {
-            quote = c;
-        } else if (c == '>') {
-            ap_value->push_back('>');
-            *ap_is_empty = false;
-            return true;
-        } else if (c == '/') {
-            while ((c = get()) != '>')
-                if (c == -1)
-                    return false;
-            ap_value->append("/>");
-            *ap_is_empty = true;
-            return true;
-        }
-        ap_value->push_back(static_cast<char>(c));
+        c = get();
     }
+    ap_value->append("/>");
+    *ap_is_empty = true;
+    return true;
 }
 
 bool c_xml::p_nested_content(std::string *ap_value, std::string *ap_end_tag_name, bool a_expand_entities,

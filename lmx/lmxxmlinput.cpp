@@ -87,35 +87,45 @@ bool c_get_for_xml::skip_PI() {
     }
 }
 
-bool c_get_for_xml::move_to_start_tag_end(bool *ap_end_of_element) {
+int c_get_for_xml::skip_to_tag_char(bool a_stop_at_slash, std::string *ap_copy) {
     int quote = 0;
     for (;;) {
         int c = get();
         if (c == -1)
-            return false;
+            return -1;
         if (quote) {
             if (c == quote)
                 quote = 0;
         } else if (c == '"' || c == '\'') {
             quote = c;
-        } else if (c == '>') {
-            *ap_end_of_element = false;
-            return true;
-        } else if (c == '/') {
-            bool is_errored = false;
-            for (c = get(); c != '>'; c = get()) {
-                if (c == -1)
-                    return false;
-                if (!is_white(c) && !is_errored) {
-                    error(elmx_type_error, elmx_end_tag_syntax,
-                          std::string("Illegal character(s) after / at end of tag - ") + static_cast<char>(c));
-                    is_errored = true;
-                }
-            }
-            *ap_end_of_element = true;
-            return !is_errored;
+        } else if (c == '>' || (c == '/' && a_stop_at_slash)) {
+            return c;
+        }
+        if (ap_copy)
+            ap_copy->push_back(static_cast<char>(c));
+    }
+}
+
+bool c_get_for_xml::move_to_start_tag_end(bool *ap_end_of_element) {
+    int c = skip_to_tag_char(true);
+    if (c == -1)
+        return false;
+    if (c == '>') {
+        *ap_end_of_element = false;
+        return true;
+    }
+    bool is_errored = false;
+    for (c = get(); c != '>'; c = get()) {
+        if (c == -1)
+            return false;
+        if (!is_white(c) && !is_errored) {
+            error(elmx_type_error, elmx_end_tag_syntax,
+                  std::string("Illegal character(s) after / at end of tag - ") + static_cast<char>(c));
+            is_errored = true;
         }
     }
+    *ap_end_of_element = true;
+    return !is_errored;
 }
 
 } // namespace lmx

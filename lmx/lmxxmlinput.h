@@ -34,6 +34,10 @@ public:
     bool skip_comment();
     // Skips up to the first "?>"; false at the end of input.
     bool skip_PI();
+    // Reads on to the first ">" (or "/", if a_stop_at_slash) that stands
+    // outside quotes and gives it, or -1 at the end of input. Every byte passed
+    // over goes to ap_copy, if one is given.
+    int skip_to_tag_char(bool a_stop_at_slash, std::string *ap_copy = nullptr);
     // Moves past the ">" of the current start tag, quotes respected;
     // *ap_end_of_element tells whether it was "/>".
     bool move_to_start_tag_end(bool *ap_end_of_element);
