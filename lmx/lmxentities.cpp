@@ -171,13 +171,13 @@ void c_get_with_entities::rewind() {
     c_get_as_utf8::rewind();
 }
 
-std::size_t c_get_with_entities::take_text_run(const unsigned char *ap_stop, std::string *ap_value) {
+std::size_t c_get_with_entities::take_text_run(const s_run_stops &ar_stops, std::string *ap_value) {
     if (!m_entity_stack.empty())
         return 0;
     bool needs_blank = m_ws_mode == ws_collapse && pending_whitespace && !ap_value->empty();
     if (needs_blank)
         ap_value->push_back(' ');
-    std::size_t taken = take_raw_run(ap_stop, *ap_value);
+    std::size_t taken = take_raw_run(ar_stops, *ap_value);
     if (taken == 0) {
         if (needs_blank)
             ap_value->pop_back();

@@ -245,13 +245,13 @@ protected:
     // Appends a run of plain bytes straight from the source, under the current
     // whitespace mode, stopping where ap_stop says or at anything that needs
     // the careful path. Returns the number of bytes taken.
-    std::size_t take_text_run(const unsigned char *ap_stop, std::string *ap_value);
+    std::size_t take_text_run(const s_run_stops &ar_stops, std::string *ap_value);
     void skip_white_run() {
         if (m_entity_stack.empty())
             skip_raw_white();
     }
-    std::size_t take_name_run(const unsigned char *ap_stop, std::string *ap_name) {
-        return m_entity_stack.empty() ? take_raw_run(ap_stop, *ap_name) : 0;
+    std::size_t take_name_run(const s_run_stops &ar_stops, std::string *ap_name) {
+        return m_entity_stack.empty() ? take_raw_run(ar_stops, *ap_name) : 0;
     }
     int peek_plain_input() const { return m_entity_stack.empty() ? peek_plain() : -1; }
 

@@ -17,22 +17,30 @@ struct s_stop_tables {
     unsigned char text[256];       // character data: "<", "&"
     unsigned char text_white[256]; // character data where white space is folded
     unsigned char name[256];       // anything that is not a name character
-    unsigned char double_quoted[256];
-    unsigned char single_quoted[256];
 
-    s_stop_tables() : text(), text_white(), name(), double_quoted(), single_quoted() {
+    s_stop_tables() : text(), text_white(), name() {
         for (int c = 0; c < 256; ++c) {
             bool careful = c == 0 || c == '\r' || c == '\n' || c >= 0x80;
             text[c] = careful || c == '<' || c == '&';
             text_white[c] = text[c] || is_white(c);
             name[c] = careful || !is_xml_name_char(c);
-            double_quoted[c] = careful || c == '"';
-            single_quoted[c] = careful || c == '\'';
         }
     }
 };
 
-const s_stop_tables k_stop;
+const s_stop_tables k_tables;
+
+// Runs of character data, of names and of quoted values.
+const s_run_stops k_text_stops = {k_tables.text, '<', '&'};
+const s_run_stops k_folded_text_stops = {k_tables.text_white, 0, 0};
+const s_run_stops k_name_stops = {k_tables.name, 0, 0};
+const s_run_stops k_double_quoted_stops = {nullptr, '"', '"'};
+const s_run_stops k_single_quoted_stops = {nullptr, '\'', '\''};
+
+// White space is folded in every mode but ws_preserve.
+const s_run_stops &text_stops(elmx_whitespace a_mode) {
+    return a_mode == ws_preserve ? k_text_stops : k_folded_text_stops;
+}
 
 } // namespace
 
@@ -131,7 +139,7 @@ bool c_xml::p_read_name(int a_first, std::string *ap_name) {
 // Reads on to the end of a name.
 bool c_xml::p_read_name_tail(std::string *ap_name) {
     for (;;) {
-        take_name_run(k_stop.name, ap_name);
+        take_name_run(k_name_stops, ap_name);
         // A plain terminator can stay where it is; reading and pushing it
         // back would change nothing.
         int next = peek_plain_input();
@@ -217,9 +225,9 @@ elxp_xml_event c_xml::p_handle_lt_pling(std::string *ap_name, bool *ap_again) {
 
 elxp_xml_event c_xml::p_get_xml_text(std::string *ap_name) {
     pending_whitespace = false;
-    const unsigned char *p_stop = get_ws_mode() == ws_preserve ? k_stop.text : k_stop.text_white;
+    const s_run_stops &stops = text_stops(get_ws_mode());
     for (;;) {
-        take_text_run(p_stop, ap_name);
+        take_text_run(stops, ap_name);
         int c = get();
         if (c == -1 || c == '<') {
             unget(c);
@@ -338,10 +346,10 @@ bool c_xml::p_capture_attribute_value(c_attribute_data *ap_data, std::size_t *ap
     if (quote == '"' || quote == '\'') {
         ap_data->put(static_cast<char>(quote));
         *ap_value_index = ap_data->size();
-        const unsigned char *p_stop = quote == '"' ? k_stop.double_quoted : k_stop.single_quoted;
+        const s_run_stops &stops = quote == '"' ? k_double_quoted_stops : k_single_quoted_stops;
         std::string &bytes = ap_data->bytes();
         for (;;) {
-            take_name_run(p_stop, &bytes);
+            take_name_run(stops, &bytes);
             c = get();
             if (c == quote) {
                 ap_data->mark_segment_end();
@@ -385,8 +393,9 @@ bool c_xml::p_register_namespace(c_xml_local *ap_local_control, const std::strin
 elxp_xml_event c_xml::get_attribute_name(std::string *ap_name, bool a_in_xml_decl) {
     if (!m_attributes.is_eof()) {
         const char *p_name = m_attributes.get_str();
-        m_attributes.next_segment();
-        ap_name->assign(p_name, std::strlen(p_name));
+        std::size_t length = std::strlen(p_name);
+        m_attributes.set_index(m_attributes.get_index() + length + 1); // past the name's NUL
+        ap_name->assign(p_name, length);
         return xe_name;
     }
     int c = get_non_ws();
@@ -474,9 +483,9 @@ bool c_xml::get_xsi_type(c_xml_local *ap_xml_local, int *ap_type_ns_id, std::str
 bool c_xml::get_element_value(std::string *ap_value, elmx_whitespace a_ws_mode, bool a_expand_entities) {
     ap_value->clear();
     set_ws_mode(a_ws_mode);
-    const unsigned char *p_stop = a_ws_mode == ws_preserve ? k_stop.text : k_stop.text_white;
+    const s_run_stops &stops = text_stops(a_ws_mode);
     for (;;) {
-        take_text_run(p_stop, ap_value);
+        take_text_run(stops, ap_value);
         int c = get();
         if (c == -1) {
             error(elmx_type_error, elmx_unexpected_end_of_message, "Premature end of file encountered");
@@ -658,10 +667,10 @@ c_xml::e_tag_type c_xml::p_get_any_tag_data(std::string *ap_value, std::string *
     if (c != '<') {
         // Text; white space that stands directly before a tag is dropped.
         std::size_t start = ap_value->size();
-        const unsigned char *p_stop = get_ws_mode() == ws_preserve ? k_stop.text : k_stop.text_white;
+        const s_run_stops &stops = text_stops(get_ws_mode());
         unget(c);
         for (;;) {
-            take_text_run(p_stop, ap_value);
+            take_text_run(stops, ap_value);
             c = get();
             if (c == -1 || c == '<')
                 break;

@@ -16,6 +16,10 @@
 #include <string>
 #include <vector>
 
+#ifdef __SSE2__
+#include <emmintrin.h>
+#endif
+
 #include "lmxerror.h"
 
 namespace lmx {
@@ -129,6 +133,16 @@ enum e_encoding_mode {
     mode_ucs2_le = 6
 };
 
+// Where a run of plain bytes taken in bulk ends. With first set, at first or
+// second; otherwise at every byte whose entry in p_table is not 0. Either way
+// a run ends at NUL, at a line end and at bytes of 0x80 and up, which need
+// the careful path for decoding, folding and counting: tables must say so.
+struct s_run_stops {
+    const unsigned char *p_table;
+    unsigned char first;
+    unsigned char second;
+};
+
 // Encodes one code point into a buffer of at least 5 bytes, NUL-terminated.
 char *unicode_char_to_utf8(std::uint32_t a_c, char *ap_buffer);
 // Decodes the 1 to 4 byte sequence at ap_sequence; false if it is malformed
@@ -171,12 +185,10 @@ public:
     e_encoding_mode get_encoding_mode() const { return m_mode; }
 
 protected:
-    // Appends to ar_out the longest run of buffered bytes for which
-    // ap_stop[byte] is zero, as get() would deliver them, and returns its length.
-    // Takes nothing unless the stream is in its plain UTF-8 state. Stop tables
-    // must stop at bytes of 0x80 and above, NUL and both line end characters,
-    // which need the careful path for folding and counting.
-    std::size_t take_raw_run(const unsigned char *ap_stop, std::string &ar_out);
+    // Appends to ar_out the longest run of buffered bytes that ar_stops lets
+    // through, as get() would deliver them, and returns its length. Takes
+    // nothing unless the stream is in its plain UTF-8 state.
+    std::size_t take_raw_run(const s_run_stops &ar_stops, std::string &ar_out);
     // Passes over buffered blanks, tabs and line feeds, as get() would.
     void skip_raw_white();
     // The next buffered byte if it is plain ASCII that get() would hand up
@@ -224,17 +236,50 @@ private:
     std::int32_t m_line = 1;
 };
 
-inline std::size_t c_get_as_utf8::take_raw_run(const unsigned char *ap_stop, std::string &ar_out) {
+// The first byte from ap_p on that is a or b, or that needs the careful path
+// (NUL, a line end, 0x80 and up); ap_end if there is none. Sixteen bytes at a
+// time where the processor allows.
+inline const unsigned char *find_run_end(const unsigned char *ap_p, const unsigned char *ap_end, unsigned char a,
+                                         unsigned char b) {
+#ifdef __SSE2__
+    const __m128i va = _mm_set1_epi8(static_cast<char>(a));
+    const __m128i vb = _mm_set1_epi8(static_cast<char>(b));
+    const __m128i vcr = _mm_set1_epi8('\r');
+    const __m128i vlf = _mm_set1_epi8('\n');
+    const __m128i vnul = _mm_setzero_si128();
+    while (ap_end - ap_p >= 16) {
+        __m128i x = _mm_loadu_si128(reinterpret_cast<const __m128i *>(ap_p));
+        __m128i hits = _mm_or_si128(_mm_or_si128(_mm_cmpeq_epi8(x, va), _mm_cmpeq_epi8(x, vb)),
+                                    _mm_or_si128(_mm_cmpeq_epi8(x, vcr), _mm_cmpeq_epi8(x, vlf)));
+        hits = _mm_or_si128(hits, _mm_cmpeq_epi8(x, vnul));
+        // The sign bit of a byte is set for 0x80 and up.
+        int mask = _mm_movemask_epi8(hits) | _mm_movemask_epi8(x);
+        if (mask)
+            return ap_p + __builtin_ctz(static_cast<unsigned>(mask));
+        ap_p += 16;
+    }
+#endif
+    while (ap_p != ap_end && *ap_p != a && *ap_p != b && *ap_p != '\r' && *ap_p != '\n' && *ap_p != 0 && *ap_p < 0x80)
+        ++ap_p;
+    return ap_p;
+}
+
+inline std::size_t c_get_as_utf8::take_raw_run(const s_run_stops &ar_stops, std::string &ar_out) {
     if (!p_is_plain_state())
         return 0;
     const unsigned char *begin = ar_reader.buffered_begin();
     const unsigned char *end = ar_reader.buffered_end();
     const unsigned char *p = begin;
-    while (end - p >= 8 && !(ap_stop[p[0]] | ap_stop[p[1]] | ap_stop[p[2]] | ap_stop[p[3]] | ap_stop[p[4]] |
-                             ap_stop[p[5]] | ap_stop[p[6]] | ap_stop[p[7]]))
-        p += 8;
-    while (p != end && !ap_stop[*p])
-        ++p;
+    if (ar_stops.first) {
+        p = find_run_end(p, end, ar_stops.first, ar_stops.second);
+    } else {
+        const unsigned char *stop = ar_stops.p_table;
+        while (end - p >= 8 &&
+               !(stop[p[0]] | stop[p[1]] | stop[p[2]] | stop[p[3]] | stop[p[4]] | stop[p[5]] | stop[p[6]] | stop[p[7]]))
+            p += 8;
+        while (p != end && !stop[*p])
+            ++p;
+    }
     if (p == begin)
         return 0;
     std::size_t length = static_cast<std::size_t>(p - begin);

@@ -133,7 +133,7 @@ private:
         if (m_open.size() == m_depth)
             m_open.emplace_back();
         std::string &element_name = m_open[m_depth];
-        element_name = m_name;
+        element_name.swap(m_name); // m_name is refilled by the next event
         if (p_visitor)
             p_visitor->on_start(m_reader, element_name);
 
