@@ -65,7 +65,8 @@ public:
     bool get_namespace_attribute_value(std::string *ap_value);
     void skip_namespace_attribute_value() { m_ns_attributes.next_segment(); }
     // Looks for an attribute by namespace and local name among those not yet
-    // read; unprefixed names match only namespace 1. The read index is kept.
+    // read; unprefixed names match only namespace 1. The read index is put
+    // back where it was, found or not.
     bool get_named_attribute(c_xml_local *ap_xml_local, int a_ns_id, const std::string &ar_local_name,
                              std::string *ap_value);
     bool get_xsi_type(c_xml_local *ap_xml_local, int *ap_type_ns_id, std::string *ap_type_local_name);
