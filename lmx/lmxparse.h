@@ -12,5 +12,8 @@
 #include "lmxnamespaces.h"
 #include "lmxscanner.h"
 #include "lmxreader.h"
+#include "lmxcontainers.h"
+#include "lmxunmarshal.h"
+#include "lmxwriter.h"
 
 #endif

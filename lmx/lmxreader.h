@@ -122,6 +122,7 @@ private:
 };
 
 class c_xml_reader;
+template <typename T> class ct_typed_validation_spec;
 
 // Holds the reader's error record so that it is built before the scanner
 // layers that report to it.
@@ -246,7 +247,28 @@ public:
     bool is_auto_versioning() const { return m_auto_versioning; }
     void set_auto_versioning(bool a_auto_versioning) { m_auto_versioning = a_auto_versioning; }
     const std::string &get_name() const { return m_name; }
+    std::string &get_name_buffer() { return m_name; }
+    void set_name(const std::string &ar_name) { m_name = ar_name; }
     std::string &get_value_buffer() { return m_value; }
+
+    // Typed values into the member containers of bound classes; defined in
+    // lmxunmarshal.h. An Item is a ct_simple_* container of T.
+    template <typename Item, typename T>
+    elmx_error unmarshal_attribute_value(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec);
+    template <typename Item, typename T>
+    elmx_error unmarshal_attribute_list_value(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec);
+    template <typename Item, typename T>
+    elmx_error unmarshal_element_value(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec);
+    template <typename Item, typename T>
+    elmx_error unmarshal_element_list_value(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec);
+    template <typename Item, typename T>
+    elmx_error unmarshal_child_element(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
+                                       const s_event_map *ac_event_map);
+    template <typename Item, typename T>
+    elmx_error unmarshal_child_element_list(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
+                                            const s_event_map *ac_event_map);
+    // The whole current element as text into a container of c_any_info.
+    template <typename Item> elmx_error unmarshal_any_child_element(Item &ar_item, const s_event_map *ac_event_map);
 
 private:
     void p_crack(const std::string &ar_name, elxp_attr_elem a_type);

@@ -50,7 +50,7 @@ c_xml::c_xml(c_read &ar_reader, c_error &ar_error, bool a_is_reading_xsd)
 
 void c_xml::p_bad_well_formed(const char *ap_message) { error(elmx_type_error, elmx_not_well_formed, ap_message); }
 
-bool c_xml::p_too_deep(int a_depth) {
+bool c_xml::is_too_deep(int a_depth) {
     if (a_depth <= k_max_element_depth)
         return false;
     error(elmx_type_fatal, elmx_not_well_formed, "Element nesting too deep");
@@ -545,7 +545,7 @@ bool c_xml::skip_rest_of_empty_element(const std::string &ar_name) { return skip
 bool c_xml::skip_element_body(const std::string &ar_name) { return p_skip_element_body(ar_name, 1); }
 
 bool c_xml::p_skip_element_body(const std::string &ar_name, int a_depth) {
-    if (p_too_deep(a_depth))
+    if (is_too_deep(a_depth))
         return false;
     c_xml_local local;
     std::string name;
@@ -590,7 +590,7 @@ bool c_xml::get_nested_element_value(std::string *ap_value, std::string *ap_end_
 
 bool c_xml::p_get_any_element(const std::string &ar_name, std::string *ap_value, bool a_expand_entities,
                               int a_depth) {
-    if (p_too_deep(a_depth))
+    if (is_too_deep(a_depth))
         return false;
     ap_value->push_back('<');
     ap_value->append(ar_name);

@@ -109,6 +109,9 @@ public:
     int get_line_num() const { return c_get_as_utf8::get_line_num(); }
     void rewind();
     static bool is_error_event(int a_event) { return a_event == xe_error || a_event == xe_fatal; }
+    // For every recursive reader: true, with the fatal error recorded, once
+    // a_depth passes k_max_element_depth.
+    bool is_too_deep(int a_depth);
 
 private:
     elxp_xml_event p_handle_lt(c_xml_local *ap_local_control, std::string *ap_name, bool *ap_again);
@@ -132,7 +135,6 @@ private:
     bool p_nested_content(std::string *ap_value, std::string *ap_end_tag_name, bool a_expand_entities,
                           int a_depth);
     e_tag_type p_get_any_tag_data(std::string *ap_value, std::string *ap_name, bool a_expand_entities);
-    bool p_too_deep(int a_depth);
 
     std::string m_scratch;
     c_internal_dtd m_dtd;

@@ -6,25 +6,27 @@
 // c_xml_writer_local is one open element; the generated code keeps one on the
 // stack for each element it writes.
 //
-// Layout, with the default strings:
+// Layout, with the default strings (a tab shown as four blanks):
 //
 //     <?xml version="1.0" encoding="UTF-8"?>
-//     <cc:CxF xmlns:cc="..."
-//             xmlns:xsi="http://www.w3.org/2001/XMLSchema-instance">
-//         <cc:Tag Name="a"
-//                 Value="b"/>
-//         <cc:Creator>text</cc:Creator>
-//     </cc:CxF>
+//     <p:r xmlns:p="urn:example"
+//             xmlns:xsi="http://www.w3.org/2001/XMLSchema-instance"
+//             a="1">
+//         <p:e x="1"
+//                 y="2"/>
+//         <p:v>text</p:v>
+//     </p:r>
 //
-// (tabs shown as spaces): the first attribute stands on the tag's line, each
-// further one on a line of its own two tabs deeper than the tag; a simple
-// value stands between its tags on one line; an element with no content ends
-// "/>".
+// The first attribute stands on the tag's line, each further one on a line
+// of its own two tabs deeper than the tag; a simple value stands between its
+// tags on one line; an element with no content ends "/>". The namespace
+// declarations come before the element's own attributes.
 #ifndef LMX_LMXWRITER_H
 #define LMX_LMXWRITER_H
 
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <ostream>
 #include <string>
 #include <vector>
@@ -32,6 +34,7 @@
 #include "lmxerror.h"
 #include "lmxreader.h"
 #include "lmxtypes.h"
+#include "lmxwritebuffer.h"
 
 namespace lmx {
 
@@ -160,7 +163,15 @@ public:
     }
     c_xml_writer_local *get_xml_writer_local() const { return p_current; }
     void set_xml_writer_local(c_xml_writer_local *ap_local) { p_current = ap_local; }
-    std::ostream &get_stream() const { return ar_os; }
+
+    // Output. The writer collects its output in a block of its own and hands
+    // it to the caller's stream when the block is full, when an outermost
+    // element ends, after the prolog, and when the writer dies; drain_output
+    // hands it over at once. Text written to the caller's stream directly
+    // while the writer lives would come out of order: write through
+    // get_stream(), which the value types write to as well.
+    std::ostream &get_stream() { return m_os; }
+    void drain_output() { m_buffer.drain(); }
 
     // Constant forms: "xsi:nil" with "true" and the like. The text is escaped.
     void marshal_attribute(const char *ac_name, const char *ac_text);
@@ -212,7 +223,7 @@ public:
                                          const ct_typed_validation_spec<T> &ar_spec);
     // One value through its spec's o_to_v, with no markup.
     template <typename T> void output_value(const T &ar_value, const ct_typed_validation_spec<T> &ar_spec) {
-        ar_spec.o_to_v(ar_os, ar_value);
+        ar_spec.o_to_v(m_os, ar_value);
     }
     // True for a value whose text is empty: an empty string or binary.
     template <typename T> static bool is_value_empty(const T &) { return false; }
@@ -225,12 +236,10 @@ private:
 
     void p_init(int a_options, const char *ap_tab, const char *ap_nl, const char *ap_attribute_tab,
                 const char *ap_attribute_nl);
-    // Raw output, past the stream's sentry: the layout is all plain bytes.
-    void p_write(const char *ap_data, std::size_t a_length) {
-        p_out->sputn(ap_data, static_cast<std::streamsize>(a_length));
-    }
-    void p_write(const std::string &ar_text) { p_write(ar_text.data(), ar_text.size()); }
-    void p_write(char a_c) { p_out->sputc(a_c); }
+    // The layout is all plain bytes, straight into the block.
+    void p_write(const char *ap_data, std::size_t a_length) { m_buffer.put(ap_data, a_length); }
+    void p_write(const std::string &ar_text) { m_buffer.put(ar_text.data(), ar_text.size()); }
+    void p_write(char a_c) { m_buffer.put(a_c); }
     void p_write(const char *ap_text);
     void p_write_tabs(int a_count);
     void p_write_escaped(const std::string &ar_text);
@@ -245,10 +254,16 @@ private:
     void p_start_simple_element(const char *ac_name, const s_ns_map *ap_ns_map);
     static const c_any_info &p_any(const c_any_info &ar_info) { return ar_info; }
     static const c_any_info &p_any(const c_any_info *ap_info) { return *ap_info; }
-    c_xml_reader &p_validation_reader();
+    c_xml_reader &p_get_validation_reader() {
+        if (!p_validation_reader)
+            p_make_validation_reader();
+        return *p_validation_reader;
+    }
+    void p_make_validation_reader();
 
     std::ostream &ar_os;
-    std::streambuf *p_out;
+    c_write_buffer m_buffer; // in front of ar_os's buffer
+    std::ostream m_os;       // over m_buffer
     c_xml_writer_local *p_current;
     c_xml_writer_local m_root_local;
     std::int32_t m_indent = 0;
@@ -269,8 +284,261 @@ private:
     int m_code_line = -1;
     // Validators report to a reader; the writer keeps a reader over no input
     // for them, made when the first value is checked.
-    c_xml_reader *p_validation_reader_ = nullptr;
+    std::unique_ptr<c_xml_reader_memory> p_validation_reader;
 };
+
+// ---------------------------------------------------------------- member containers
+
+// How the writer reads a member container: whether it holds a value, how
+// many, and each one. The one seam between the writer and the containers.
+template <typename Item> struct ct_marshal_item {
+    static bool is_value_set(const Item &ar_item) { return ar_item.is_value_set(); }
+    static std::size_t count(const Item &ar_item) { return static_cast<std::size_t>(ar_item.count()); }
+    static decltype(auto) value(const Item &ar_item, std::size_t a_index) { return ar_item.access_value(a_index); }
+};
+
+// ---------------------------------------------------------------- typed values
+
+template <typename T>
+elmx_error c_xml_writer::p_check_value(const char *ac_name, const T &ar_value,
+                                       const ct_typed_validation_spec<T> &ar_spec) {
+    elmx_error error = ar_spec.is_value_valid(p_get_validation_reader(), ar_value);
+    if (error == elmx_ok)
+        return elmx_ok;
+    return handle_error(error, ac_name, p_code_file, m_code_line);
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::p_check_values(const char *ac_name, const Item &ar_item,
+                                        const ct_typed_validation_spec<T> &ar_spec) {
+    using item = ct_marshal_item<Item>;
+    std::size_t count = item::count(ar_item);
+    for (std::size_t i = 0; i < count; ++i)
+        if (elmx_error error = p_check_value<T>(ac_name, item::value(ar_item, i), ar_spec))
+            return error;
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+void c_xml_writer::p_write_list(const Item &ar_item, const ct_typed_validation_spec<T> &ar_spec) {
+    using item = ct_marshal_item<Item>;
+    std::size_t count = item::count(ar_item);
+    for (std::size_t i = 0; i < count; ++i) {
+        if (i)
+            p_write(' ');
+        output_value<T>(item::value(ar_item, i), ar_spec);
+    }
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_attribute(const char *ac_name, const Item &ar_item,
+                                           const ct_typed_validation_spec<T> &ar_spec) {
+    using item = ct_marshal_item<Item>;
+    if (!item::is_value_set(ar_item))
+        return elmx_ok;
+    if (elmx_error error = p_check_value<T>(ac_name, item::value(ar_item, 0), ar_spec))
+        return error;
+    p_open_attribute(ac_name);
+    output_value<T>(item::value(ar_item, 0), ar_spec);
+    p_close_attribute();
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_attribute_or_default(const char *ac_name, const Item &ar_item,
+                                                      const ct_typed_validation_spec<T> &ar_spec) {
+    if (ct_marshal_item<Item>::is_value_set(ar_item))
+        return marshal_attribute(ac_name, ar_item, ar_spec);
+    marshal_attribute(ac_name, ar_spec.get_default().c_str());
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_attribute_list(const char *ac_name, const Item &ar_item,
+                                                const ct_typed_validation_spec<T> &ar_spec) {
+    if (!ct_marshal_item<Item>::is_value_set(ar_item))
+        return elmx_ok;
+    if (elmx_error error = p_check_values(ac_name, ar_item, ar_spec))
+        return error;
+    p_open_attribute(ac_name);
+    p_write_list(ar_item, ar_spec);
+    p_close_attribute();
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_attribute_list_or_default(const char *ac_name, const Item &ar_item,
+                                                           const ct_typed_validation_spec<T> &ar_spec) {
+    if (ct_marshal_item<Item>::is_value_set(ar_item))
+        return marshal_attribute_list(ac_name, ar_item, ar_spec);
+    marshal_attribute(ac_name, ar_spec.get_default().c_str());
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_element(const char *ac_name, const Item &ar_item,
+                                         const ct_typed_validation_spec<T> &ar_spec, const s_ns_map *ap_ns_map) {
+    using item = ct_marshal_item<Item>;
+    std::size_t count = item::count(ar_item);
+    for (std::size_t i = 0; i < count; ++i) {
+        const T &value = item::value(ar_item, i);
+        if (elmx_error error = p_check_value<T>(ac_name, value, ar_spec))
+            return error;
+        c_xml_writer_local local(*this);
+        p_start_simple_element(ac_name, ap_ns_map);
+        output_value<T>(value, ar_spec);
+        end_element(ac_name);
+    }
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_element_or_default(const char *ac_name, const Item &ar_item,
+                                                    const ct_typed_validation_spec<T> &ar_spec,
+                                                    const s_ns_map *ap_ns_map) {
+    if (ct_marshal_item<Item>::is_value_set(ar_item))
+        return marshal_element(ac_name, ar_item, ar_spec, ap_ns_map);
+    c_xml_writer_local local(*this);
+    p_start_simple_element(ac_name, ap_ns_map);
+    p_write_escaped(ar_spec.get_default());
+    end_element(ac_name);
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_element_list(const char *ac_name, const Item &ar_item,
+                                              const ct_typed_validation_spec<T> &ar_spec,
+                                              const s_ns_map *ap_ns_map) {
+    if (!ct_marshal_item<Item>::is_value_set(ar_item))
+        return elmx_ok;
+    if (elmx_error error = p_check_values(ac_name, ar_item, ar_spec))
+        return error;
+    c_xml_writer_local local(*this);
+    p_start_simple_element(ac_name, ap_ns_map);
+    p_write_list(ar_item, ar_spec);
+    end_element(ac_name);
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_element_list_or_default(const char *ac_name, const Item &ar_item,
+                                                         const ct_typed_validation_spec<T> &ar_spec,
+                                                         const s_ns_map *ap_ns_map) {
+    if (ct_marshal_item<Item>::is_value_set(ar_item))
+        return marshal_element_list(ac_name, ar_item, ar_spec, ap_ns_map);
+    c_xml_writer_local local(*this);
+    p_start_simple_element(ac_name, ap_ns_map);
+    p_write_escaped(ar_spec.get_default());
+    end_element(ac_name);
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_element_body(const char *ac_name, const Item &ar_item,
+                                              const ct_typed_validation_spec<T> &ar_spec) {
+    using item = ct_marshal_item<Item>;
+    if (!item::is_value_set(ar_item))
+        return elmx_ok;
+    if (elmx_error error = p_check_value<T>(ac_name, item::value(ar_item, 0), ar_spec))
+        return error;
+    prepare_for_simple_body_data();
+    output_value<T>(item::value(ar_item, 0), ar_spec);
+    return elmx_ok;
+}
+
+template <typename Item, typename T>
+elmx_error c_xml_writer::marshal_element_body_list(const char *ac_name, const Item &ar_item,
+                                                   const ct_typed_validation_spec<T> &ar_spec) {
+    if (!ct_marshal_item<Item>::is_value_set(ar_item))
+        return elmx_ok;
+    if (elmx_error error = p_check_values(ac_name, ar_item, ar_spec))
+        return error;
+    prepare_for_simple_body_data();
+    p_write_list(ar_item, ar_spec);
+    return elmx_ok;
+}
+
+// ---------------------------------------------------------------- wildcards
+
+template <typename Store> void c_xml_writer::marshal_any_attribute(const Store &ar_store) {
+    for (std::size_t i = 0; i < ar_store.size(); ++i) {
+        const c_any_info &info = p_any(ar_store[i]);
+        p_open_attribute(info.get_name().c_str());
+        p_write_escaped(info.get_value());
+        p_close_attribute();
+    }
+}
+
+template <typename Item> void c_xml_writer::marshal_any_element(const Item &ar_item) {
+    using item = ct_marshal_item<Item>;
+    std::size_t count = item::count(ar_item);
+    for (std::size_t i = 0; i < count; ++i) {
+        prepare_for_simple_body_data();
+        write_any_info(item::value(ar_item, i));
+    }
+}
+
+// ---------------------------------------------------------------- whole documents
+
+// What the free marshal functions need of a class, behind one function
+// pointer, so that the stream, string and file handling is compiled once.
+struct s_marshal_job {
+    const void *p_object;
+    const char *p_name; // null: the class's own element name
+    elmx_error (*p_marshal)(const void *ap_object, const char *ap_name, c_xml_writer &ar_writer);
+};
+
+elmx_error marshal_job(const s_marshal_job &ar_job, std::ostream &ar_os, s_debug_error *ap_debug);
+elmx_error marshal_job(const s_marshal_job &ar_job, std::string *ap_out, s_debug_error *ap_debug);
+elmx_error marshal_job(const s_marshal_job &ar_job, const char *ap_file, s_debug_error *ap_debug);
+elmx_error marshal_job(const s_marshal_job &ar_job, const wchar_t *ap_file, s_debug_error *ap_debug);
+
+template <typename T> elmx_error marshal_as_own(const void *ap_object, const char *, c_xml_writer &ar_writer) {
+    return static_cast<const T *>(ap_object)->marshal(ar_writer);
+}
+template <typename T> elmx_error marshal_as_named(const void *ap_object, const char *ap_name, c_xml_writer &ar_writer) {
+    return static_cast<const T *>(ap_object)->marshal(ar_writer, ap_name);
+}
+
+// A whole document, with the prolog and the default strings, from a class
+// that writes itself under its own element name by marshal(c_xml_writer&).
+// A failed file is removed. The writer's debug record is copied to ap_debug,
+// if given, once the writer has run; a file that cannot be opened gives
+// elmx_unable_to_open_file and leaves ap_debug as it was. A string is only
+// assigned on success.
+template <typename T> elmx_error marshal(const T &ar_object, std::ostream &ar_os, s_debug_error *ap_debug = nullptr) {
+    return marshal_job({&ar_object, nullptr, &marshal_as_own<T>}, ar_os, ap_debug);
+}
+template <typename T> elmx_error marshal(const T &ar_object, std::string &ar_out, s_debug_error *ap_debug = nullptr) {
+    return marshal_job({&ar_object, nullptr, &marshal_as_own<T>}, &ar_out, ap_debug);
+}
+template <typename T> elmx_error marshal(const T &ar_object, const char *ap_file, s_debug_error *ap_debug = nullptr) {
+    return marshal_job({&ar_object, nullptr, &marshal_as_own<T>}, ap_file, ap_debug);
+}
+template <typename T>
+elmx_error marshal(const T &ar_object, const wchar_t *ap_file, s_debug_error *ap_debug = nullptr) {
+    return marshal_job({&ar_object, nullptr, &marshal_as_own<T>}, ap_file, ap_debug);
+}
+
+// The same under an element name given by the caller, prefix included
+// ("qc:QualityControl"), by marshal(c_xml_writer&, const char*).
+template <typename T>
+elmx_error marshal(const T &ar_object, const char *ac_name, std::ostream &ar_os, s_debug_error *ap_debug = nullptr) {
+    return marshal_job({&ar_object, ac_name, &marshal_as_named<T>}, ar_os, ap_debug);
+}
+template <typename T>
+elmx_error marshal(const T &ar_object, const char *ac_name, std::string &ar_out, s_debug_error *ap_debug = nullptr) {
+    return marshal_job({&ar_object, ac_name, &marshal_as_named<T>}, &ar_out, ap_debug);
+}
+template <typename T>
+elmx_error marshal(const T &ar_object, const char *ac_name, const char *ap_file, s_debug_error *ap_debug = nullptr) {
+    return marshal_job({&ar_object, ac_name, &marshal_as_named<T>}, ap_file, ap_debug);
+}
+template <typename T>
+elmx_error marshal(const T &ar_object, const char *ac_name, const wchar_t *ap_file,
+                   s_debug_error *ap_debug = nullptr) {
+    return marshal_job({&ar_object, ac_name, &marshal_as_named<T>}, ap_file, ap_debug);
+}
 
 } // namespace lmx
 
