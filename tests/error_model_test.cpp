@@ -4,6 +4,7 @@
 #include <cstring>
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -14,8 +15,17 @@
 
 namespace {
 
+using tessarine_test::at_root_with_code_location;
+using tessarine_test::document_walk;
+using tessarine_test::expect_code_location;
+using tessarine_test::expect_debug_error;
+using tessarine_test::expect_walk;
+using tessarine_test::long_hook_reader;
+using tessarine_test::next_event_is;
 using tessarine_test::recording_error;
 using tessarine_test::reported_error;
+using tessarine_test::short_hook_reader;
+using tessarine_test::text_reader;
 
 struct description_row {
     int code;
@@ -79,63 +89,47 @@ const description_row k_descriptions[] = {
     {1005, "User defined error 6"},
     {1006, "User defined error 7"},
     {1007, "User defined error 8"},
-    {1008, "User defined error 9"},
+    {1008, "User defined error 9"}, // the last user code
 };
 
 lmx::elmx_error code_of(int a_value) { return static_cast<lmx::elmx_error>(a_value); }
 
-// Keeps the document alive for as long as the reader built over it.
-struct owned_document {
-    std::string m_document;
-};
-
-// A reader whose error hooks record what they are given and may swallow one code.
-class hooked_reader : private owned_document, public lmx::c_xml_reader_memory {
+class custom_message_reader : public text_reader {
 public:
-    explicit hooked_reader(const std::string &ar_document)
-        : owned_document{ar_document}, lmx::c_xml_reader_memory(m_document) {}
-
-    struct hook_call {
-        lmx::elmx_error code;
-        std::string item;
-        std::string file;
-        int line;
-    };
-
-    lmx::elmx_error user_handle_error(lmx::elmx_error a_error, const std::string &ar_item_name,
-                                      const char *ap_prog_file, int a_prog_line) override {
-        calls.push_back({a_error, ar_item_name, ap_prog_file ? ap_prog_file : "", a_prog_line});
-        if (a_error == swallowed)
-            return lmx::elmx_ok;
-        return lmx::c_xml_reader_memory::user_handle_error(a_error, ar_item_name, ap_prog_file, a_prog_line);
-    }
-    using lmx::c_xml_reader_memory::user_handle_error;
-
-    lmx::elmx_error swallowed = lmx::elmx_ok;
-    std::vector<hook_call> calls;
-};
-
-// A reader that only overrides the short hook.
-class short_hook_reader : private owned_document, public lmx::c_xml_reader_memory {
-public:
-    explicit short_hook_reader(const std::string &ar_document)
-        : owned_document{ar_document}, lmx::c_xml_reader_memory(m_document) {}
-
-    lmx::elmx_error user_handle_error(lmx::elmx_error a_error) override {
-        seen.push_back(a_error);
-        return a_error == lmx::elmx_unexpected_attribute ? lmx::elmx_ok : a_error;
-    }
-    using lmx::c_xml_reader_memory::user_handle_error;
-
-    std::vector<lmx::elmx_error> seen;
-};
-
-class custom_message_reader : private owned_document, public lmx::c_xml_reader_memory {
-public:
-    explicit custom_message_reader(const std::string &ar_document)
-        : owned_document{ar_document}, lmx::c_xml_reader_memory(m_document) {}
+    using text_reader::text_reader;
     void get_error_message(std::string *ap_message) const override { *ap_message = "custom message"; }
 };
+
+// What get_error_info gives. The outputs start as the caller says, so that a
+// test can see which of them were written.
+struct error_info {
+    bool found;
+    lmx::elmx_error_type type;
+    lmx::elmx_error code;
+    int line;
+};
+
+error_info info_of(const lmx::c_error &ar_error, lmx::elmx_error_type a_type = lmx::elmx_type_none,
+                   lmx::elmx_error a_code = lmx::elmx_ok, int a_line = 0) {
+    error_info info{false, a_type, a_code, a_line};
+    info.found = ar_error.get_error_info(&info.type, &info.code, &info.line);
+    return info;
+}
+
+void expect_info(const error_info &ar_info, bool a_found, lmx::elmx_error_type a_type, lmx::elmx_error a_code,
+                 int a_line) {
+    EXPECT_EQ(ar_info.found, a_found);
+    EXPECT_EQ(ar_info.type, a_type);
+    EXPECT_EQ(ar_info.code, a_code);
+    EXPECT_EQ(ar_info.line, a_line);
+}
+
+void expect_counts(const lmx::c_error &ar_error, int a_fatal, int a_errors, int a_warnings, int a_notices) {
+    EXPECT_EQ(ar_error.get_fatal_count(), a_fatal);
+    EXPECT_EQ(ar_error.get_error_count(), a_errors);
+    EXPECT_EQ(ar_error.get_warning_count(), a_warnings);
+    EXPECT_EQ(ar_error.get_notice_count(), a_notices);
+}
 
 // ---------------------------------------------------------------------------
 // The code table
@@ -155,43 +149,43 @@ TEST(ErrorTable, EveryCodeHasItsText) {
 }
 
 TEST(ErrorTable, EnumeratorsHaveTheirValues) {
-    EXPECT_EQ(lmx::elmx_ok, 0);
-    EXPECT_EQ(lmx::elmx_unable_to_open_file, 1);
-    EXPECT_EQ(lmx::elmx_xml_badly_formed, 5);
-    EXPECT_EQ(lmx::elmx_encoding_not_supported, 6);
-    EXPECT_EQ(lmx::elmx_bad_dtd, 9);
-    EXPECT_EQ(lmx::elmx_encoding_mismatch, 15);
-    EXPECT_EQ(lmx::elmx_external_entity, 17);
-    EXPECT_EQ(lmx::elmx_not_well_formed, 23);
-    EXPECT_EQ(lmx::elmx_recursive_entity, 24);
-    EXPECT_EQ(lmx::elmx_unexpected_end_of_message, 34);
-    EXPECT_EQ(lmx::elmx_entity_not_found, 41);
-    EXPECT_EQ(lmx::elmx_marshal_occurs_error, 46);
-    EXPECT_EQ(lmx::elmx_user_defined_1, 1000);
-    EXPECT_EQ(lmx::elmx_user_defined_9, 1008);
-    EXPECT_EQ(lmx::elmx_type_fatal, 0);
-    EXPECT_EQ(lmx::elmx_type_error, 1);
-    EXPECT_EQ(lmx::elmx_type_warning, 2);
-    EXPECT_EQ(lmx::elmx_type_notice, 3);
-    EXPECT_EQ(lmx::elmx_type_none, 4);
-}
-
-TEST(ErrorTable, CodeAfterTheLastRuntimeCodeHasNoText) {
-    EXPECT_STREQ(lmx::get_error_description(code_of(47)), "");
-}
-
-TEST(ErrorTable, CodeJustBelowTheUserRangeHasNoText) {
-    EXPECT_STREQ(lmx::get_error_description(code_of(999)), "");
-}
-
-TEST(ErrorTable, LastUserCodeIsUserDefinedErrorNine) {
-    EXPECT_STREQ(lmx::get_error_description(code_of(1008)), "User defined error 9");
+    tessarine_test::expect_constants({
+        TESSARINE_CONSTANT(lmx::elmx_ok, 0),
+        TESSARINE_CONSTANT(lmx::elmx_unable_to_open_file, 1),
+        TESSARINE_CONSTANT(lmx::elmx_xml_badly_formed, 5),
+        TESSARINE_CONSTANT(lmx::elmx_encoding_not_supported, 6),
+        TESSARINE_CONSTANT(lmx::elmx_bad_dtd, 9),
+        TESSARINE_CONSTANT(lmx::elmx_encoding_mismatch, 15),
+        TESSARINE_CONSTANT(lmx::elmx_external_entity, 17),
+        TESSARINE_CONSTANT(lmx::elmx_not_well_formed, 23),
+        TESSARINE_CONSTANT(lmx::elmx_recursive_entity, 24),
+        TESSARINE_CONSTANT(lmx::elmx_unexpected_end_of_message, 34),
+        TESSARINE_CONSTANT(lmx::elmx_entity_not_found, 41),
+        TESSARINE_CONSTANT(lmx::elmx_marshal_occurs_error, 46),
+        TESSARINE_CONSTANT(lmx::elmx_user_defined_1, 1000),
+        TESSARINE_CONSTANT(lmx::elmx_user_defined_9, 1008),
+        TESSARINE_CONSTANT(lmx::elmx_type_fatal, 0),
+        TESSARINE_CONSTANT(lmx::elmx_type_error, 1),
+        TESSARINE_CONSTANT(lmx::elmx_type_warning, 2),
+        TESSARINE_CONSTANT(lmx::elmx_type_notice, 3),
+        TESSARINE_CONSTANT(lmx::elmx_type_none, 4),
+    });
 }
 
 TEST(ErrorTable, CodesOutsideTheTableGiveEmptyTextNeverNull) {
-    for (int code : {-1, 47, 100, 998, 999, 1009, 2000, 0x7fffffff}) {
-        SCOPED_TRACE(code);
-        const char *text = lmx::get_error_description(code_of(code));
+    const std::pair<int, const char *> rows[] = {
+        {-1, "negative"},
+        {47, "after the last runtime code"},
+        {100, "between the runtime and the user codes"},
+        {998, "between the runtime and the user codes"},
+        {999, "just below the user range"},
+        {1009, "after the last user code"},
+        {2000, "after the last user code"},
+        {0x7fffffff, "the largest code"},
+    };
+    for (const auto &row : rows) {
+        SCOPED_TRACE(std::to_string(row.first) + ", " + row.second);
+        const char *text = lmx::get_error_description(code_of(row.first));
         ASSERT_NE(text, nullptr);
         EXPECT_STREQ(text, "");
     }
@@ -211,44 +205,28 @@ TEST(ErrorRecord, FreshRecordIsClear) {
     lmx::c_error error;
     EXPECT_EQ(error.get_last_error(), lmx::elmx_ok);
     EXPECT_FALSE(error.is_fatal_errored());
-    EXPECT_EQ(error.get_fatal_count(), 0);
-    EXPECT_EQ(error.get_error_count(), 0);
-    EXPECT_EQ(error.get_warning_count(), 0);
-    EXPECT_EQ(error.get_notice_count(), 0);
+    expect_counts(error, 0, 0, 0, 0);
 }
 
 TEST(ErrorRecord, GetErrorInfoOnFreshRecordIsFalseAndLeavesOutputsAlone) {
     lmx::c_error error;
-    lmx::elmx_error_type type = lmx::elmx_type_notice;
-    lmx::elmx_error code = lmx::elmx_user_defined_5;
-    int line = 4711;
-    EXPECT_FALSE(error.get_error_info(&type, &code, &line));
-    EXPECT_EQ(type, lmx::elmx_type_notice);
-    EXPECT_EQ(code, lmx::elmx_user_defined_5);
-    EXPECT_EQ(line, 4711);
+    expect_info(info_of(error, lmx::elmx_type_notice, lmx::elmx_user_defined_5, 4711), false, lmx::elmx_type_notice,
+                lmx::elmx_user_defined_5, 4711);
 }
 
 TEST(ErrorRecord, GetErrorInfoGivesTypeCodeAndLineOfTheLastError) {
     lmx::c_error error;
     error.error(lmx::elmx_type_error, lmx::elmx_not_well_formed, "doc.xml", 17, "message");
-    lmx::elmx_error_type type = lmx::elmx_type_none;
-    lmx::elmx_error code = lmx::elmx_ok;
-    int line = 0;
-    EXPECT_TRUE(error.get_error_info(&type, &code, &line));
-    EXPECT_EQ(type, lmx::elmx_type_error);
-    EXPECT_EQ(code, lmx::elmx_not_well_formed);
-    EXPECT_EQ(line, 17);
+    expect_info(info_of(error), true, lmx::elmx_type_error, lmx::elmx_not_well_formed, 17);
 }
 
 TEST(ErrorRecord, GetErrorInfoIsFalseWhenTheLastCodeIsOk) {
     lmx::c_error error;
     error.error(lmx::elmx_type_warning, lmx::elmx_ok, "doc.xml", 3, "nothing wrong");
-    lmx::elmx_error_type type = lmx::elmx_type_none;
-    lmx::elmx_error code = lmx::elmx_user_defined_1;
-    int line = 99;
-    EXPECT_FALSE(error.get_error_info(&type, &code, &line));
-    EXPECT_EQ(code, lmx::elmx_user_defined_1);
-    EXPECT_EQ(line, 99);
+    const error_info info = info_of(error, lmx::elmx_type_none, lmx::elmx_user_defined_1, 99);
+    EXPECT_FALSE(info.found);
+    EXPECT_EQ(info.code, lmx::elmx_user_defined_1);
+    EXPECT_EQ(info.line, 99);
     EXPECT_EQ(error.get_warning_count(), 1);
 }
 
@@ -272,17 +250,12 @@ TEST(ErrorRecord, CountersRiseBySeverity) {
         SCOPED_TRACE(row.type);
         lmx::c_error error;
         error.error(row.type, lmx::elmx_bad_comment, "doc.xml", 1, "message");
-        EXPECT_EQ(error.get_fatal_count(), row.fatal);
-        EXPECT_EQ(error.get_error_count(), row.errors);
-        EXPECT_EQ(error.get_warning_count(), row.warnings);
-        EXPECT_EQ(error.get_notice_count(), row.notices);
+        expect_counts(error, row.fatal, row.errors, row.warnings, row.notices);
         EXPECT_EQ(error.is_fatal_errored(), row.fatal > 0);
         EXPECT_EQ(error.get_last_error(), lmx::elmx_bad_comment);
-        lmx::elmx_error_type type = lmx::elmx_type_fatal;
-        lmx::elmx_error code = lmx::elmx_ok;
-        int line = 0;
-        EXPECT_TRUE(error.get_error_info(&type, &code, &line));
-        EXPECT_EQ(type, row.type);
+        const error_info info = info_of(error, lmx::elmx_type_fatal);
+        EXPECT_TRUE(info.found);
+        EXPECT_EQ(info.type, row.type);
     }
 }
 
@@ -292,10 +265,7 @@ TEST(ErrorRecord, CountersAccumulateOverNonFatalErrors) {
     error.error(lmx::elmx_type_error, lmx::elmx_bad_xml_decl, "f", 2, "b");
     error.error(lmx::elmx_type_warning, lmx::elmx_bad_comment, "f", 3, "c");
     error.error(lmx::elmx_type_notice, lmx::elmx_external_entity, "f", 4, "d");
-    EXPECT_EQ(error.get_fatal_count(), 0);
-    EXPECT_EQ(error.get_error_count(), 2);
-    EXPECT_EQ(error.get_warning_count(), 2);
-    EXPECT_EQ(error.get_notice_count(), 1);
+    expect_counts(error, 0, 2, 2, 1);
     EXPECT_FALSE(error.is_fatal_errored());
 }
 
@@ -303,13 +273,7 @@ TEST(ErrorRecord, LaterNonFatalErrorOverwritesEarlierOne) {
     lmx::c_error error;
     error.error(lmx::elmx_type_error, lmx::elmx_not_well_formed, "f", 5, "first");
     error.error(lmx::elmx_type_warning, lmx::elmx_bad_comment, "f", 9, "second");
-    lmx::elmx_error_type type = lmx::elmx_type_none;
-    lmx::elmx_error code = lmx::elmx_ok;
-    int line = 0;
-    ASSERT_TRUE(error.get_error_info(&type, &code, &line));
-    EXPECT_EQ(type, lmx::elmx_type_warning);
-    EXPECT_EQ(code, lmx::elmx_bad_comment);
-    EXPECT_EQ(line, 9);
+    expect_info(info_of(error), true, lmx::elmx_type_warning, lmx::elmx_bad_comment, 9);
     EXPECT_EQ(error.get_last_error(), lmx::elmx_bad_comment);
 }
 
@@ -369,17 +333,8 @@ TEST(ErrorRecord, SecondErrorOfAnySeverityAfterFatalChangesNothing) {
 
         EXPECT_EQ(error.reports().size(), 1u) << "report_error must not be called after a fatal error";
         EXPECT_EQ(error.get_last_error(), lmx::elmx_bad_dtd);
-        EXPECT_EQ(error.get_fatal_count(), 1);
-        EXPECT_EQ(error.get_error_count(), 1);
-        EXPECT_EQ(error.get_warning_count(), 0);
-        EXPECT_EQ(error.get_notice_count(), 0);
-        lmx::elmx_error_type type = lmx::elmx_type_none;
-        lmx::elmx_error code = lmx::elmx_ok;
-        int line = 0;
-        ASSERT_TRUE(error.get_error_info(&type, &code, &line));
-        EXPECT_EQ(type, lmx::elmx_type_fatal);
-        EXPECT_EQ(code, lmx::elmx_bad_dtd);
-        EXPECT_EQ(line, 7);
+        expect_counts(error, 1, 1, 0, 0);
+        expect_info(info_of(error), true, lmx::elmx_type_fatal, lmx::elmx_bad_dtd, 7);
     }
 }
 
@@ -389,12 +344,21 @@ TEST(ErrorRecord, ErrorWithoutBoundGetterHasNoFileAndLineMinusOne) {
     ASSERT_EQ(error.reports().size(), 1u);
     EXPECT_FALSE(error.reports()[0].has_file);
     EXPECT_EQ(error.reports()[0].line, -1);
-    lmx::elmx_error_type type = lmx::elmx_type_none;
-    lmx::elmx_error code = lmx::elmx_ok;
-    int line = 0;
-    ASSERT_TRUE(error.get_error_info(&type, &code, &line));
-    EXPECT_EQ(line, -1);
+    const error_info info = info_of(error);
+    ASSERT_TRUE(info.found);
+    EXPECT_EQ(info.line, -1);
 }
+
+// A getter over its own input, reporting to the caller's record, which takes
+// source id and line from it while it lives.
+struct bound_getter {
+    bound_getter(std::string a_input, lmx::c_error &ar_error)
+        : input(std::move(a_input)), source(input.data(), input.size()), getter(source, ar_error) {}
+
+    std::string input;
+    lmx::c_read_memory source;
+    lmx::c_get_as_utf8 getter;
+};
 
 // Reads values until the line counter shows a_line.
 void advance_to_line(lmx::c_get_as_utf8 &ar_getter, int a_line) {
@@ -404,11 +368,9 @@ void advance_to_line(lmx::c_get_as_utf8 &ar_getter, int a_line) {
 
 TEST(ErrorRecord, ErrorTakesSourceIdAndLineFromTheBoundGetter) {
     recording_error error;
-    const std::string input = "<\n\n\n";
     {
-        lmx::c_read_memory source(input.data(), input.size());
-        lmx::c_get_as_utf8 getter(source, error);
-        advance_to_line(getter, 3);
+        bound_getter bound("<\n\n\n", error);
+        advance_to_line(bound.getter, 3);
         error.error(lmx::elmx_type_warning, lmx::elmx_bad_comment, "while bound");
         ASSERT_EQ(error.reports().size(), 1u);
         EXPECT_TRUE(error.reports()[0].has_file);
@@ -424,15 +386,11 @@ TEST(ErrorRecord, ErrorTakesSourceIdAndLineFromTheBoundGetter) {
 
 TEST(ErrorRecord, InnerGetterBindsUntilItGoesAndTheOuterOneIsBoundAgain) {
     recording_error error;
-    const std::string outer_input = "<\n\n\n\n";
-    const std::string inner_input = "<\n";
-    lmx::c_read_memory outer_source(outer_input.data(), outer_input.size());
-    lmx::c_get_as_utf8 outer(outer_source, error);
-    advance_to_line(outer, 5);
+    bound_getter outer("<\n\n\n\n", error);
+    advance_to_line(outer.getter, 5);
     {
-        lmx::c_read_memory inner_source(inner_input.data(), inner_input.size());
-        lmx::c_get_as_utf8 inner(inner_source, error);
-        advance_to_line(inner, 2);
+        bound_getter inner("<\n", error);
+        advance_to_line(inner.getter, 2);
         error.error(lmx::elmx_type_notice, lmx::elmx_bad_comment, "inner");
         ASSERT_EQ(error.reports().size(), 1u);
         EXPECT_EQ(error.reports()[0].line, 2);
@@ -444,13 +402,9 @@ TEST(ErrorRecord, InnerGetterBindsUntilItGoesAndTheOuterOneIsBoundAgain) {
 
 TEST(ErrorRecord, BinderBindsOnceAndPutsTheOldGetterBack) {
     recording_error error;
-    const std::string first_input = "<\n\n\n";
-    const std::string second_input = "<";
-    lmx::c_read_memory first_source(first_input.data(), first_input.size());
-    lmx::c_get_as_utf8 first(first_source, error);
-    advance_to_line(first, 4);
-    lmx::c_read_memory second_source(second_input.data(), second_input.size());
-    lmx::c_get_as_utf8 second(second_source, error); // now bound: line 1
+    bound_getter first("<\n\n\n", error);
+    advance_to_line(first.getter, 4);
+    bound_getter second("<", error); // now bound: line 1
 
     error.error(lmx::elmx_type_notice, lmx::elmx_bad_comment, "second");
     ASSERT_EQ(error.reports().size(), 1u);
@@ -458,9 +412,9 @@ TEST(ErrorRecord, BinderBindsOnceAndPutsTheOldGetterBack) {
     {
         lmx::c_getter_error_binder binder(error);
         EXPECT_EQ(binder.get_getter(), nullptr);
-        binder.bind(&first);
-        binder.bind(&second); // already bound: no effect
-        EXPECT_EQ(binder.get_getter(), &first);
+        binder.bind(&first.getter);
+        binder.bind(&second.getter); // already bound: no effect
+        EXPECT_EQ(binder.get_getter(), &first.getter);
         error.error(lmx::elmx_type_notice, lmx::elmx_bad_comment, "first again");
         ASSERT_EQ(error.reports().size(), 2u);
         EXPECT_EQ(error.reports().back().line, 4);
@@ -472,12 +426,10 @@ TEST(ErrorRecord, BinderBindsOnceAndPutsTheOldGetterBack) {
 
 TEST(ErrorRecord, GetterErrorFillsInSourceIdAndCurrentLine) {
     recording_error error;
-    const std::string input = "<a\nb\n";
-    lmx::c_read_memory source(input.data(), input.size());
-    lmx::c_get_as_utf8 getter(source, error);
-    advance_to_line(getter, 2);
-    getter.error(lmx::elmx_type_error, lmx::elmx_not_well_formed, "from the format form");
-    getter.error(lmx::elmx_type_warning, lmx::elmx_bad_comment, std::string("from the string form"));
+    bound_getter bound("<a\nb\n", error);
+    advance_to_line(bound.getter, 2);
+    bound.getter.error(lmx::elmx_type_error, lmx::elmx_not_well_formed, "from the format form");
+    bound.getter.error(lmx::elmx_type_warning, lmx::elmx_bad_comment, std::string("from the string form"));
     ASSERT_EQ(error.reports().size(), 2u);
     EXPECT_EQ(error.reports()[0].code, lmx::elmx_not_well_formed);
     EXPECT_EQ(error.reports()[0].message, "from the format form");
@@ -495,33 +447,21 @@ TEST(ErrorRecord, GetterErrorFillsInSourceIdAndCurrentLine) {
 
 TEST(DebugError, DefaultRecordIsClear) {
     lmx::s_debug_error debug;
-    EXPECT_EQ(debug.error, lmx::elmx_ok);
-    EXPECT_EQ(debug.item_name, "");
     ASSERT_NE(debug.p_prog_file, nullptr);
-    EXPECT_STREQ(debug.p_prog_file, "(not set)");
-    EXPECT_EQ(debug.prog_line, -1);
-    EXPECT_EQ(debug.xml_line, -1);
+    expect_debug_error(debug, lmx::elmx_ok, "", "(not set)", -1, -1);
 }
 
 TEST(DebugError, SetStoresEveryField) {
     lmx::s_debug_error debug;
     debug.set(lmx::elmx_bad_end_of_element, "Object", "reader.cpp", 120, 33);
-    EXPECT_EQ(debug.error, lmx::elmx_bad_end_of_element);
-    EXPECT_EQ(debug.item_name, "Object");
-    EXPECT_STREQ(debug.p_prog_file, "reader.cpp");
-    EXPECT_EQ(debug.prog_line, 120);
-    EXPECT_EQ(debug.xml_line, 33);
+    expect_debug_error(debug, lmx::elmx_bad_end_of_element, "Object", "reader.cpp", 120, 33);
 }
 
 TEST(DebugError, ClearResetsEveryField) {
     lmx::s_debug_error debug;
     debug.set(lmx::elmx_bad_end_of_element, "Object", "reader.cpp", 120, 33);
     debug.clear();
-    EXPECT_EQ(debug.error, lmx::elmx_ok);
-    EXPECT_EQ(debug.item_name, "");
-    EXPECT_STREQ(debug.p_prog_file, "(not set)");
-    EXPECT_EQ(debug.prog_line, -1);
-    EXPECT_EQ(debug.xml_line, -1);
+    expect_debug_error(debug, lmx::elmx_ok, "", "(not set)", -1, -1);
 }
 
 TEST(DebugError, ClearedRecordPrintsOneLine) {
@@ -534,39 +474,44 @@ TEST(DebugError, ClearedRecordPrintsOneLine) {
     EXPECT_EQ(debug.to_string(), "Error: No Error\n");
 }
 
-TEST(DebugError, OkCodeStopsTheTextAfterTheFirstLineWhateverTheOtherFields) {
-    lmx::s_debug_error debug;
-    debug.set(lmx::elmx_ok, "item", "file.cpp", 10, 20);
-    EXPECT_EQ(debug.to_string(), "Error: No Error\n");
-}
+struct text_form_row {
+    const char *name;
+    lmx::elmx_error error;
+    const char *item;
+    const char *prog_file;
+    int prog_line;
+    int xml_line;
+    const char *text;
+};
 
-TEST(DebugError, FullTextFormWithXmlLine) {
-    lmx::s_debug_error debug;
-    debug.set(lmx::elmx_unexpected_attribute, "@colour", "cxf3.cpp", 4711, 42);
-    EXPECT_EQ(debug.to_string(), "Error: Unexpected attribute\n"
-                                 "Item: @colour\n"
-                                 "Program file: cxf3.cpp\n"
-                                 "Program line: 4711\n"
-                                 "XML line: 42\n");
-}
-
-TEST(DebugError, TextFormWithoutXmlLineWhenItIsMinusOne) {
-    lmx::s_debug_error debug;
-    debug.set(lmx::elmx_mandatory_element_missing, "Object", "writer.cpp", 8, -1);
-    EXPECT_EQ(debug.to_string(), "Error: Mandatory element missing\n"
-                                 "Item: Object\n"
-                                 "Program file: writer.cpp\n"
-                                 "Program line: 8\n");
-}
-
-TEST(DebugError, TextFormWithEmptyItemAndNegativeProgramLine) {
-    lmx::s_debug_error debug;
-    debug.set(lmx::elmx_user_defined_9, "", "(not set)", -1, 0);
-    EXPECT_EQ(debug.to_string(), "Error: User defined error 9\n"
-                                 "Item: \n"
-                                 "Program file: (not set)\n"
-                                 "Program line: -1\n"
-                                 "XML line: 0\n");
+TEST(DebugError, TextFormOfASetRecord) {
+    const text_form_row rows[] = {
+        {"ok code stops the text after the first line whatever the other fields", lmx::elmx_ok, "item", "file.cpp",
+         10, 20, "Error: No Error\n"},
+        {"full text form with XML line", lmx::elmx_unexpected_attribute, "@colour", "cxf3.cpp", 4711, 42,
+         "Error: Unexpected attribute\n"
+         "Item: @colour\n"
+         "Program file: cxf3.cpp\n"
+         "Program line: 4711\n"
+         "XML line: 42\n"},
+        {"no XML line when it is -1", lmx::elmx_mandatory_element_missing, "Object", "writer.cpp", 8, -1,
+         "Error: Mandatory element missing\n"
+         "Item: Object\n"
+         "Program file: writer.cpp\n"
+         "Program line: 8\n"},
+        {"empty item and negative program line", lmx::elmx_user_defined_9, "", "(not set)", -1, 0,
+         "Error: User defined error 9\n"
+         "Item: \n"
+         "Program file: (not set)\n"
+         "Program line: -1\n"
+         "XML line: 0\n"},
+    };
+    for (const text_form_row &row : rows) {
+        SCOPED_TRACE(row.name);
+        lmx::s_debug_error debug;
+        debug.set(row.error, row.item, row.prog_file, row.prog_line, row.xml_line);
+        EXPECT_EQ(debug.to_string(), row.text);
+    }
 }
 
 TEST(DebugError, StreamInsertionWritesTheTextForm) {
@@ -604,9 +549,10 @@ TEST(DebugError, RecordCanBeAssigned) {
 // Reader: capture and handling
 // ---------------------------------------------------------------------------
 
+const std::string k_utf16_declared_in_utf8 = "<?xml version=\"1.0\" encoding=\"UTF-16\"?><a><b/></a>";
+
 TEST(ReaderErrors, FreshReaderHasNoError) {
-    const std::string document = "<a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<a/>");
     EXPECT_EQ(reader.get_error(), lmx::elmx_ok);
     EXPECT_EQ(reader.get_debug_error().error, lmx::elmx_ok);
     EXPECT_EQ(reader.get_error_message(), "Error: No Error\n");
@@ -615,19 +561,16 @@ TEST(ReaderErrors, FreshReaderHasNoError) {
 }
 
 TEST(ReaderErrors, EncodingMismatchInXmlDeclarationEndsWithThatCodeEverywhere) {
-    const std::string document = "<?xml version=\"1.0\" encoding=\"UTF-16\"?><a><b/></a>";
-    lmx::c_xml_reader_memory reader(document);
-    tessarine_test::traced_walk walk = tessarine_test::walk_traced(reader);
-    EXPECT_EQ(walk.error(), lmx::elmx_encoding_mismatch);
-    EXPECT_EQ(reader.get_error(), lmx::elmx_encoding_mismatch);
-    EXPECT_TRUE(reader.get_error_record().is_fatal_errored());
-    EXPECT_EQ(reader.get_debug_error().error, lmx::elmx_encoding_mismatch);
-    EXPECT_EQ(walk.seen.elements.size(), 0u);
+    document_walk w(k_utf16_declared_in_utf8);
+    expect_walk(w.walk, lmx::elmx_encoding_mismatch);
+    EXPECT_EQ(w.reader.get_error(), lmx::elmx_encoding_mismatch);
+    EXPECT_TRUE(w.reader.get_error_record().is_fatal_errored());
+    EXPECT_EQ(w.reader.get_debug_error().error, lmx::elmx_encoding_mismatch);
+    EXPECT_EQ(w.walk.seen.elements.size(), 0u);
 }
 
 TEST(ReaderErrors, EndOfInputAfterEncodingMismatchIsReportedAsTheMismatch) {
-    const std::string document = "<?xml version=\"1.0\" encoding=\"UTF-16\"?><a><b/></a>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader(k_utf16_declared_in_utf8);
     lmx::elmx_error error = lmx::elmx_ok;
     std::string name;
     int event = reader.get_element_event(&error, &name);
@@ -645,23 +588,16 @@ TEST(ReaderErrors, EndOfInputAfterEncodingMismatchIsReportedAsTheMismatch) {
 }
 
 TEST(ReaderErrors, CaptureKeepsUnexpectedEndWhileNotFatalErrored) {
-    const std::string document = "<a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<a/>");
     EXPECT_EQ(reader.capture_error(lmx::elmx_unexpected_end_of_message, "a", "capture.cpp", 10),
               lmx::elmx_unexpected_end_of_message);
-    const lmx::s_debug_error &debug = reader.get_debug_error();
-    EXPECT_EQ(debug.error, lmx::elmx_unexpected_end_of_message);
-    EXPECT_EQ(debug.item_name, "a");
-    EXPECT_STREQ(debug.p_prog_file, "capture.cpp");
-    EXPECT_EQ(debug.prog_line, 10);
-    EXPECT_EQ(debug.xml_line, 1);
+    expect_debug_error(reader.get_debug_error(), lmx::elmx_unexpected_end_of_message, "a", "capture.cpp", 10, 1);
     // Capture writes the debug record only.
     EXPECT_EQ(reader.get_error(), lmx::elmx_ok);
 }
 
 TEST(ReaderErrors, CaptureKeepsUnexpectedEndAfterANonFatalError) {
-    const std::string document = "<a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<a/>");
     reader.get_error_record().error(lmx::elmx_type_error, lmx::elmx_not_well_formed, nullptr, 1, "not fatal");
     EXPECT_EQ(reader.capture_error(lmx::elmx_unexpected_end_of_message, "a", "capture.cpp", 10),
               lmx::elmx_unexpected_end_of_message);
@@ -669,8 +605,7 @@ TEST(ReaderErrors, CaptureKeepsUnexpectedEndAfterANonFatalError) {
 }
 
 TEST(ReaderErrors, CaptureReplacesUnexpectedEndByTheFatalCause) {
-    const std::string document = "<a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<a/>");
     reader.get_error_record().error(lmx::elmx_type_fatal, lmx::elmx_bad_dtd, nullptr, 1, "fatal");
     EXPECT_EQ(reader.capture_error(lmx::elmx_unexpected_end_of_message, "a", "capture.cpp", 11), lmx::elmx_bad_dtd);
     EXPECT_EQ(reader.get_debug_error().error, lmx::elmx_bad_dtd);
@@ -679,8 +614,7 @@ TEST(ReaderErrors, CaptureReplacesUnexpectedEndByTheFatalCause) {
 }
 
 TEST(ReaderErrors, CaptureLeavesOtherCodesAloneWhenFatalErrored) {
-    const std::string document = "<a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<a/>");
     reader.get_error_record().error(lmx::elmx_type_fatal, lmx::elmx_bad_dtd, nullptr, 1, "fatal");
     EXPECT_EQ(reader.capture_error(lmx::elmx_bad_end_of_element, "a", "capture.cpp", 12),
               lmx::elmx_bad_end_of_element);
@@ -689,8 +623,7 @@ TEST(ReaderErrors, CaptureLeavesOtherCodesAloneWhenFatalErrored) {
 }
 
 TEST(ReaderErrors, CaptureKeepsTheLastCapture) {
-    const std::string document = "<a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<a/>");
     reader.capture_error(lmx::elmx_bad_end_of_element, "first", "one.cpp", 1);
     reader.capture_error(lmx::elmx_unexpected_attribute, "second", "two.cpp", 2);
     EXPECT_EQ(reader.get_debug_error().error, lmx::elmx_unexpected_attribute);
@@ -699,89 +632,58 @@ TEST(ReaderErrors, CaptureKeepsTheLastCapture) {
 }
 
 TEST(ReaderErrors, CaptureRecordsTheScannerLine) {
-    const std::string document = "\n\n<a/>";
-    lmx::c_xml_reader_memory reader(document);
-    lmx::elmx_error error = lmx::elmx_ok;
-    ASSERT_EQ(reader.get_element_event(&error), lmx::xe_name);
+    text_reader reader("\n\n<a/>");
+    ASSERT_TRUE(next_event_is(reader, lmx::xe_name));
     reader.capture_error(lmx::elmx_element_not_found, "a", "capture.cpp", 3);
     EXPECT_EQ(reader.get_debug_error().xml_line, 3);
     EXPECT_EQ(reader.get_line_no(), 3);
 }
 
 TEST(ReaderErrors, HandleErrorTakesNameAndCodeLocationFromTheReader) {
-    const std::string document = "<abc/>";
-    lmx::c_xml_reader_memory reader(document);
-    lmx::elmx_error error = lmx::elmx_ok;
-    ASSERT_EQ(reader.get_element_event(&error), lmx::xe_name);
-    reader.set_code_file("generated.cpp");
-    reader.set_code_line(77);
+    text_reader reader("<abc/>");
+    ASSERT_TRUE(at_root_with_code_location(reader, "generated.cpp", 77));
     EXPECT_EQ(reader.handle_error(lmx::elmx_element_not_found), lmx::elmx_element_not_found);
-    const lmx::s_debug_error &debug = reader.get_debug_error();
-    EXPECT_EQ(debug.error, lmx::elmx_element_not_found);
-    EXPECT_EQ(debug.item_name, "abc");
-    EXPECT_STREQ(debug.p_prog_file, "generated.cpp");
-    EXPECT_EQ(debug.prog_line, 77);
-    EXPECT_EQ(debug.xml_line, 1);
+    expect_debug_error(reader.get_debug_error(), lmx::elmx_element_not_found, "abc", "generated.cpp", 77, 1);
 }
 
 TEST(ReaderErrors, HandleErrorWithLineTakesTheLineFromTheArgument) {
-    const std::string document = "<abc/>";
-    lmx::c_xml_reader_memory reader(document);
-    lmx::elmx_error error = lmx::elmx_ok;
-    ASSERT_EQ(reader.get_element_event(&error), lmx::xe_name);
-    reader.set_code_file("generated.cpp");
-    reader.set_code_line(77);
+    text_reader reader("<abc/>");
+    ASSERT_TRUE(at_root_with_code_location(reader, "generated.cpp", 77));
     EXPECT_EQ(reader.handle_error(lmx::elmx_bad_choice, 88), lmx::elmx_bad_choice);
-    EXPECT_EQ(reader.get_debug_error().item_name, "abc");
-    EXPECT_STREQ(reader.get_debug_error().p_prog_file, "generated.cpp");
-    EXPECT_EQ(reader.get_debug_error().prog_line, 88);
+    expect_code_location(reader.get_debug_error(), "abc", "generated.cpp", 88);
 }
 
 TEST(ReaderErrors, HandleErrorBeforeAnyCodeLocationUsesTheUnspecifiedFile) {
-    const std::string document = "<abc/>";
-    lmx::c_xml_reader_memory reader(document);
-    lmx::elmx_error error = lmx::elmx_ok;
-    ASSERT_EQ(reader.get_element_event(&error), lmx::xe_name);
+    text_reader reader("<abc/>");
+    ASSERT_TRUE(next_event_is(reader, lmx::xe_name));
     reader.handle_error(lmx::elmx_element_not_found);
     EXPECT_STREQ(reader.get_debug_error().p_prog_file, "<unspecified>");
     EXPECT_EQ(reader.get_debug_error().prog_line, -1);
 }
 
 TEST(ReaderErrors, HandleErrorWithAllArgumentsUsesThem) {
-    const std::string document = "<abc/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<abc/>");
     EXPECT_EQ(reader.handle_error(lmx::elmx_value_above_maximum, "Value", "values.cpp", 5),
               lmx::elmx_value_above_maximum);
-    EXPECT_EQ(reader.get_debug_error().item_name, "Value");
-    EXPECT_STREQ(reader.get_debug_error().p_prog_file, "values.cpp");
-    EXPECT_EQ(reader.get_debug_error().prog_line, 5);
+    expect_code_location(reader.get_debug_error(), "Value", "values.cpp", 5);
 }
 
 TEST(ReaderErrors, HandleAttributeErrorPutsAtSignBeforeTheCurrentName) {
-    const std::string document = "<Colour/>";
-    lmx::c_xml_reader_memory reader(document);
-    lmx::elmx_error error = lmx::elmx_ok;
-    ASSERT_EQ(reader.get_element_event(&error), lmx::xe_name);
-    reader.set_code_file("attributes.cpp");
-    reader.set_code_line(9);
+    text_reader reader("<Colour/>");
+    ASSERT_TRUE(at_root_with_code_location(reader, "attributes.cpp", 9));
     EXPECT_EQ(reader.handle_attribute_error(lmx::elmx_unexpected_attribute), lmx::elmx_unexpected_attribute);
     EXPECT_EQ(reader.get_debug_error().error, lmx::elmx_unexpected_attribute);
-    EXPECT_EQ(reader.get_debug_error().item_name, "@Colour");
-    EXPECT_STREQ(reader.get_debug_error().p_prog_file, "attributes.cpp");
-    EXPECT_EQ(reader.get_debug_error().prog_line, 9);
+    expect_code_location(reader.get_debug_error(), "@Colour", "attributes.cpp", 9);
 }
 
 TEST(ReaderErrors, UnreadableAttributeIsReportedWithAtSignAndItsName) {
-    const std::string document = "<a colour=\"&undefined;\"/>";
-    lmx::c_xml_reader_memory reader(document);
-    tessarine_test::traced_walk walk = tessarine_test::walk_traced(reader);
-    EXPECT_EQ(walk.error(), lmx::elmx_unable_to_read_attribute);
-    EXPECT_EQ(reader.get_debug_error().item_name, "@colour");
+    document_walk w("<a colour=\"&undefined;\"/>");
+    expect_walk(w.walk, lmx::elmx_unable_to_read_attribute);
+    EXPECT_EQ(w.reader.get_debug_error().item_name, "@colour");
 }
 
 TEST(ReaderErrors, ErrorMessageIsTheTextFormOfTheDebugRecord) {
-    const std::string document = "<a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<a/>");
     reader.handle_error(lmx::elmx_bad_end_of_element, "item", "reading.cpp", 12);
     const std::string expected = "Error: Bad end of element\n"
                                  "Item: item\n"
@@ -802,21 +704,19 @@ TEST(ReaderErrors, ByValueErrorMessageGoesThroughTheVirtualOne) {
 }
 
 TEST(ReaderErrors, TruncatedDocumentReportsUnexpectedEndWithXmlLine) {
-    const std::string document = "<a>\n<b>";
-    lmx::c_xml_reader_memory reader(document);
-    tessarine_test::traced_walk walk = tessarine_test::walk_traced(reader);
-    EXPECT_EQ(walk.error(), lmx::elmx_unexpected_end_of_message);
-    EXPECT_EQ(reader.get_debug_error().error, lmx::elmx_unexpected_end_of_message);
-    EXPECT_EQ(reader.get_debug_error().xml_line, 2);
-    const std::string message = reader.get_error_message();
+    document_walk w("<a>\n<b>");
+    expect_walk(w.walk, lmx::elmx_unexpected_end_of_message);
+    EXPECT_EQ(w.reader.get_debug_error().error, lmx::elmx_unexpected_end_of_message);
+    EXPECT_EQ(w.reader.get_debug_error().xml_line, 2);
+    const std::string message = w.reader.get_error_message();
     EXPECT_EQ(message.rfind("Error: Unexpected end of message\nItem: ", 0), 0u) << message;
     EXPECT_NE(message.find("\nXML line: 2\n"), std::string::npos) << message;
     // No low layer complained: the end of input is the cause.
-    EXPECT_EQ(reader.get_error(), lmx::elmx_ok);
+    EXPECT_EQ(w.reader.get_error(), lmx::elmx_ok);
 }
 
 TEST(ReaderErrors, UserHookSeesTheCaptureArgumentsAndItsVerdictIsReturned) {
-    hooked_reader reader("<a/>");
+    long_hook_reader reader("<a/>");
     EXPECT_EQ(reader.handle_error(lmx::elmx_bad_choice, "Choice", "hook.cpp", 31), lmx::elmx_bad_choice);
     ASSERT_EQ(reader.calls.size(), 1u);
     EXPECT_EQ(reader.calls[0].code, lmx::elmx_bad_choice);
@@ -826,7 +726,7 @@ TEST(ReaderErrors, UserHookSeesTheCaptureArgumentsAndItsVerdictIsReturned) {
 }
 
 TEST(ReaderErrors, UserHookReturningOkSwallowsTheError) {
-    hooked_reader reader("<a/>");
+    long_hook_reader reader("<a/>");
     reader.swallowed = lmx::elmx_unexpected_attribute;
     EXPECT_EQ(reader.handle_error(lmx::elmx_unexpected_attribute, "@x", "hook.cpp", 1), lmx::elmx_ok);
     // The capture happened before the hook was asked.
@@ -837,11 +737,8 @@ TEST(ReaderErrors, UserHookReturningOkSwallowsTheError) {
 }
 
 TEST(ReaderErrors, ShortFormsAndAttributeFormReachTheUserHook) {
-    hooked_reader reader("<abc/>");
-    lmx::elmx_error error = lmx::elmx_ok;
-    ASSERT_EQ(reader.get_element_event(&error), lmx::xe_name);
-    reader.set_code_file("generated.cpp");
-    reader.set_code_line(5);
+    long_hook_reader reader("<abc/>");
+    ASSERT_TRUE(at_root_with_code_location(reader, "generated.cpp", 5));
     reader.swallowed = lmx::elmx_unexpected_attribute;
     EXPECT_EQ(reader.handle_attribute_error(lmx::elmx_unexpected_attribute), lmx::elmx_ok);
     EXPECT_EQ(reader.handle_error(lmx::elmx_unexpected_attribute), lmx::elmx_ok);
@@ -857,16 +754,15 @@ TEST(ReaderErrors, ShortFormsAndAttributeFormReachTheUserHook) {
 
 TEST(ReaderErrors, LongHookForwardsToTheShortHookByDefault) {
     short_hook_reader reader("<a/>");
+    reader.swallowed = lmx::elmx_unexpected_attribute;
     EXPECT_EQ(reader.handle_error(lmx::elmx_unexpected_attribute, "@x", "hook.cpp", 1), lmx::elmx_ok);
     EXPECT_EQ(reader.handle_error(lmx::elmx_bad_end_of_element, "a", "hook.cpp", 2), lmx::elmx_bad_end_of_element);
-    ASSERT_EQ(reader.seen.size(), 2u);
-    EXPECT_EQ(reader.seen[0], lmx::elmx_unexpected_attribute);
-    EXPECT_EQ(reader.seen[1], lmx::elmx_bad_end_of_element);
+    EXPECT_EQ(reader.seen, (std::vector<lmx::elmx_error>{lmx::elmx_unexpected_attribute,
+                                                         lmx::elmx_bad_end_of_element}));
 }
 
 TEST(ReaderErrors, DefaultHooksReturnTheCode) {
-    const std::string document = "<a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<a/>");
     EXPECT_EQ(reader.user_handle_error(lmx::elmx_bad_choice), lmx::elmx_bad_choice);
     EXPECT_EQ(reader.user_handle_error(lmx::elmx_bad_choice, "x", "f.cpp", 1), lmx::elmx_bad_choice);
     // The hooks alone capture nothing.
@@ -876,19 +772,17 @@ TEST(ReaderErrors, DefaultHooksReturnTheCode) {
 TEST(ReaderErrors, SwallowedErrorLetsTheWalkCarryOn) {
     // Text after the root is refused by the walk; a reader that swallows
     // that refusal reads on to the end.
-    hooked_reader reader("<a><b/></a>trailing");
+    long_hook_reader reader("<a><b/></a>trailing");
     reader.swallowed = lmx::elmx_xml_badly_formed;
-    tessarine_test::traced_walk walk = tessarine_test::walk_traced(reader);
-    EXPECT_EQ(walk.error(), lmx::elmx_ok) << walk.result.message;
-    EXPECT_EQ(walk.trace(), "<a><b></b></a>");
+    const tessarine_test::traced_walk walk = tessarine_test::walk_traced(reader);
+    expect_walk(walk, lmx::elmx_ok, "<a><b></b></a>");
     EXPECT_EQ(reader.get_debug_error().error, lmx::elmx_xml_badly_formed);
     ASSERT_EQ(reader.calls.size(), 1u);
     EXPECT_EQ(reader.calls[0].code, lmx::elmx_xml_badly_formed);
 }
 
 TEST(ReaderErrors, RewindKeepsTheErrorState) {
-    const std::string document = "<?xml version=\"1.0\" encoding=\"UTF-16\"?><a/>";
-    lmx::c_xml_reader_memory reader(document);
+    text_reader reader("<?xml version=\"1.0\" encoding=\"UTF-16\"?><a/>");
     tessarine_test::walk_traced(reader);
     ASSERT_EQ(reader.get_error(), lmx::elmx_encoding_mismatch);
     reader.rewind();
@@ -900,14 +794,11 @@ TEST(ReaderErrors, RewindKeepsTheErrorState) {
 }
 
 TEST(ReaderErrors, WarningsDoNotStopTheReaderButShowInGetError) {
-    const std::string document = "<a><!-- comment ---><b/></a>";
-    lmx::c_xml_reader_memory reader(document);
-    tessarine_test::traced_walk walk = tessarine_test::walk_traced(reader);
-    EXPECT_EQ(walk.error(), lmx::elmx_ok) << walk.result.message;
-    EXPECT_EQ(walk.trace(), "<a><b></b></a>");
-    EXPECT_EQ(reader.get_error(), lmx::elmx_bad_comment);
-    EXPECT_FALSE(reader.get_error_record().is_fatal_errored());
-    EXPECT_EQ(reader.get_error_record().get_warning_count(), 1);
+    document_walk w("<a><!-- comment ---><b/></a>");
+    expect_walk(w.walk, lmx::elmx_ok, "<a><b></b></a>");
+    EXPECT_EQ(w.reader.get_error(), lmx::elmx_bad_comment);
+    EXPECT_FALSE(w.reader.get_error_record().is_fatal_errored());
+    EXPECT_EQ(w.reader.get_error_record().get_warning_count(), 1);
 }
 
 } // namespace
