@@ -68,6 +68,57 @@ template <typename T> std::size_t float_to_chars(char *ap_buffer, T a_value, int
     return static_cast<std::size_t>(result.ptr - ap_buffer);
 }
 
+// A double that is the nearest double to a decimal of few places, as measured
+// values are, is written from that decimal: m / 10^k == value, computed with
+// IEEE division, means exactly that. Such a decimal of at most 14 significant
+// digits is also what "%.14g" makes of the value: the value lies far closer to
+// it than to any other 14-digit decimal. Only values from 1e-4 up to 1e14 are
+// taken, which "%.14g" writes without an exponent. Gives 0 when the value is
+// not of that kind, for the general conversion to do.
+std::size_t short_decimal_to_chars(char *ap_buffer, double a_value) {
+    static const double k_powers_of_ten[] = {1e0, 1e1, 1e2, 1e3, 1e4, 1e5, 1e6, 1e7, 1e8};
+    const double k_max_digits_value = 1e14; // 14 significant digits
+    double magnitude = std::fabs(a_value);
+    if (!(magnitude >= 1e-4 && magnitude < k_max_digits_value))
+        return 0;
+    for (int places = 0; places < 9; ++places) {
+        double scaled = magnitude * k_powers_of_ten[places];
+        if (scaled >= k_max_digits_value)
+            return 0;
+        long long digits = static_cast<long long>(scaled + 0.5);
+        // A decimal that is the value's nearest lies within a few units of the
+        // last place of the scaled value; the cheap test spares most divisions.
+        double candidate = static_cast<double>(digits);
+        if (std::fabs(scaled - candidate) > 1e-9 * scaled || candidate / k_powers_of_ten[places] != magnitude)
+            continue;
+        char text[24];
+        std::size_t length = static_cast<std::size_t>(std::to_chars(text, text + sizeof text, digits).ptr - text);
+        char *p = ap_buffer;
+        if (a_value < 0)
+            *p++ = '-';
+        std::size_t places_count = static_cast<std::size_t>(places);
+        if (places_count == 0) {
+            std::memcpy(p, text, length);
+            p += length;
+        } else if (length > places_count) {
+            std::memcpy(p, text, length - places_count);
+            p += length - places_count;
+            *p++ = '.';
+            std::memcpy(p, text + length - places_count, places_count);
+            p += places_count;
+        } else {
+            *p++ = '0';
+            *p++ = '.';
+            std::memset(p, '0', places_count - length);
+            p += places_count - length;
+            std::memcpy(p, text, length);
+            p += length;
+        }
+        return static_cast<std::size_t>(p - ap_buffer);
+    }
+    return 0;
+}
+
 // atof after making the decimal point the current locale's.
 double locale_atof(const char *ap_text) {
     const char *p_point = std::localeconv()->decimal_point;
@@ -209,7 +260,10 @@ double atofloat(const std::string &ar_text) { return atofloat(ar_text.c_str()); 
 
 std::size_t to_xml_chars(char *ap_buffer, float a_value) { return float_to_chars(ap_buffer, a_value, 7); }
 
-std::size_t to_xml_chars(char *ap_buffer, double a_value) { return float_to_chars(ap_buffer, a_value, 14); }
+std::size_t to_xml_chars(char *ap_buffer, double a_value) {
+    std::size_t length = short_decimal_to_chars(ap_buffer, a_value);
+    return length ? length : float_to_chars(ap_buffer, a_value, 14);
+}
 
 std::ostream &output_convert_to_xml(std::ostream &ar_os, float a_value) {
     char buffer[k_float_text_size];
