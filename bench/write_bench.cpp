@@ -65,12 +65,19 @@ const lmx::s_ns_map k_ns_map_writer[] = {
 //
 // Each writes itself as a generated class does: a scope object, the start
 // tag, the namespace declarations (written once, on the root), the
-// attributes, the children, the end tag.
+// attributes, the children, the end tag. write_element does the frame; the
+// content is the class's own.
 
-void open_element(lmx::c_xml_writer &ar_writer, const char *ac_name) {
+template <typename Content>
+lmx::elmx_error write_element(lmx::c_xml_writer &ar_writer, const char *ac_name, Content a_content) {
+    lmx::c_xml_writer_local local(ar_writer);
     ar_writer.start_element(ac_name);
     ar_writer.conditionally_select_ns_map(k_ns_map_writer);
     ar_writer.conditionally_write_ns_attrs(true);
+    if (lmx::elmx_error error = a_content())
+        return error;
+    ar_writer.end_element(ac_name);
+    return lmx::elmx_ok;
 }
 
 struct reflectance_spectrum {
@@ -79,17 +86,14 @@ struct reflectance_spectrum {
     list_member<double> values;
 
     lmx::elmx_error marshal(lmx::c_xml_writer &ar_writer, const char *ac_name) const {
-        lmx::c_xml_writer_local local(ar_writer);
-        open_element(ar_writer, ac_name);
-        if (lmx::elmx_error error =
-                ar_writer.marshal_attribute("ColorSpecification", color_specification, k_string_spec))
-            return error;
-        if (lmx::elmx_error error = ar_writer.marshal_attribute("StartWL", start_wl, k_int_spec))
-            return error;
-        if (lmx::elmx_error error = ar_writer.marshal_element_body_list(ac_name, values, k_double_list_spec))
-            return error;
-        ar_writer.end_element(ac_name);
-        return lmx::elmx_ok;
+        return write_element(ar_writer, ac_name, [&]() -> lmx::elmx_error {
+            if (lmx::elmx_error error =
+                    ar_writer.marshal_attribute("ColorSpecification", color_specification, k_string_spec))
+                return error;
+            if (lmx::elmx_error error = ar_writer.marshal_attribute("StartWL", start_wl, k_int_spec))
+                return error;
+            return ar_writer.marshal_element_body_list(ac_name, values, k_double_list_spec);
+        });
     }
 };
 
@@ -98,19 +102,16 @@ struct color_cielab {
     value_member<double> l, a, b;
 
     lmx::elmx_error marshal(lmx::c_xml_writer &ar_writer, const char *ac_name) const {
-        lmx::c_xml_writer_local local(ar_writer);
-        open_element(ar_writer, ac_name);
-        if (lmx::elmx_error error =
-                ar_writer.marshal_attribute("ColorSpecification", color_specification, k_string_spec))
-            return error;
-        if (lmx::elmx_error error = ar_writer.marshal_element("cc:L", l, k_lightness_spec, nullptr))
-            return error;
-        if (lmx::elmx_error error = ar_writer.marshal_element("cc:A", a, k_double_spec, nullptr))
-            return error;
-        if (lmx::elmx_error error = ar_writer.marshal_element("cc:B", b, k_double_spec, nullptr))
-            return error;
-        ar_writer.end_element(ac_name);
-        return lmx::elmx_ok;
+        return write_element(ar_writer, ac_name, [&]() -> lmx::elmx_error {
+            if (lmx::elmx_error error =
+                    ar_writer.marshal_attribute("ColorSpecification", color_specification, k_string_spec))
+                return error;
+            if (lmx::elmx_error error = ar_writer.marshal_element("cc:L", l, k_lightness_spec, nullptr))
+                return error;
+            if (lmx::elmx_error error = ar_writer.marshal_element("cc:A", a, k_double_spec, nullptr))
+                return error;
+            return ar_writer.marshal_element("cc:B", b, k_double_spec, nullptr);
+        });
     }
 };
 
@@ -120,25 +121,19 @@ struct color_object {
     color_cielab lab;
 
     lmx::elmx_error marshal(lmx::c_xml_writer &ar_writer, const char *ac_name) const {
-        lmx::c_xml_writer_local local(ar_writer);
-        open_element(ar_writer, ac_name);
-        if (lmx::elmx_error error = ar_writer.marshal_attribute("ObjectType", object_type, k_string_spec))
-            return error;
-        if (lmx::elmx_error error = ar_writer.marshal_attribute("Name", name, k_string_spec))
-            return error;
-        if (lmx::elmx_error error = ar_writer.marshal_attribute("Id", id, k_string_spec))
-            return error;
-        {
-            lmx::c_xml_writer_local values(ar_writer);
-            open_element(ar_writer, "cc:ColorValues");
-            if (lmx::elmx_error error = spectrum.marshal(ar_writer, "cc:ReflectanceSpectrum"))
+        return write_element(ar_writer, ac_name, [&]() -> lmx::elmx_error {
+            if (lmx::elmx_error error = ar_writer.marshal_attribute("ObjectType", object_type, k_string_spec))
                 return error;
-            if (lmx::elmx_error error = lab.marshal(ar_writer, "cc:ColorCIELab"))
+            if (lmx::elmx_error error = ar_writer.marshal_attribute("Name", name, k_string_spec))
                 return error;
-            ar_writer.end_element("cc:ColorValues");
-        }
-        ar_writer.end_element(ac_name);
-        return lmx::elmx_ok;
+            if (lmx::elmx_error error = ar_writer.marshal_attribute("Id", id, k_string_spec))
+                return error;
+            return write_element(ar_writer, "cc:ColorValues", [&]() -> lmx::elmx_error {
+                if (lmx::elmx_error error = spectrum.marshal(ar_writer, "cc:ReflectanceSpectrum"))
+                    return error;
+                return lab.marshal(ar_writer, "cc:ColorCIELab");
+            });
+        });
     }
 };
 
@@ -148,36 +143,26 @@ struct document {
     std::vector<color_object> objects;
 
     lmx::elmx_error marshal(lmx::c_xml_writer &ar_writer, const char *ac_name) const {
-        lmx::c_xml_writer_local local(ar_writer);
-        open_element(ar_writer, ac_name);
-        {
-            lmx::c_xml_writer_local information(ar_writer);
-            open_element(ar_writer, "cc:FileInformation");
-            if (lmx::elmx_error error = ar_writer.marshal_element("cc:Creator", creator, k_string_spec, nullptr))
-                return error;
-            if (lmx::elmx_error error =
-                    ar_writer.marshal_element("cc:CreationDate", creation_date, k_datetime_spec, nullptr))
-                return error;
-            if (lmx::elmx_error error =
-                    ar_writer.marshal_element("cc:Description", description, k_string_spec, nullptr))
-                return error;
-            ar_writer.end_element("cc:FileInformation");
-        }
-        {
-            lmx::c_xml_writer_local resources(ar_writer);
-            open_element(ar_writer, "cc:Resources");
-            {
-                lmx::c_xml_writer_local collection(ar_writer);
-                open_element(ar_writer, "cc:ObjectCollection");
-                for (const color_object &object : objects)
-                    if (lmx::elmx_error error = object.marshal(ar_writer, "cc:Object"))
+        return write_element(ar_writer, ac_name, [&]() -> lmx::elmx_error {
+            if (lmx::elmx_error error = write_element(ar_writer, "cc:FileInformation", [&]() -> lmx::elmx_error {
+                    if (lmx::elmx_error error =
+                            ar_writer.marshal_element("cc:Creator", creator, k_string_spec, nullptr))
                         return error;
-                ar_writer.end_element("cc:ObjectCollection");
-            }
-            ar_writer.end_element("cc:Resources");
-        }
-        ar_writer.end_element(ac_name);
-        return lmx::elmx_ok;
+                    if (lmx::elmx_error error =
+                            ar_writer.marshal_element("cc:CreationDate", creation_date, k_datetime_spec, nullptr))
+                        return error;
+                    return ar_writer.marshal_element("cc:Description", description, k_string_spec, nullptr);
+                }))
+                return error;
+            return write_element(ar_writer, "cc:Resources", [&] {
+                return write_element(ar_writer, "cc:ObjectCollection", [&]() -> lmx::elmx_error {
+                    for (const color_object &object : objects)
+                        if (lmx::elmx_error error = object.marshal(ar_writer, "cc:Object"))
+                            return error;
+                    return lmx::elmx_ok;
+                });
+            });
+        });
     }
     lmx::elmx_error marshal(lmx::c_xml_writer &ar_writer) const { return marshal(ar_writer, "cc:CxF"); }
 };

@@ -281,28 +281,29 @@ private:
     bool m_is_set;
 };
 
+// A member kind over the storage of Base under a name of its own, which
+// generated code chooses by: swap takes the kind itself, and an optional
+// kind is never missing.
+template <typename Self, typename Base, bool Optional> class ct_simple_kind : public Base {
+public:
+    bool is_occurs_ok() const { return Optional || Base::is_occurs_ok(); }
+    void swap(Self &ar_other) { Base::swap(ar_other); }
+};
+
 // An optional one: never missing, left out by the writer while unset.
 template <typename T, typename V = T, typename M = ct_non_mixed<T>>
-class ct_simple_pod_optional : public ct_simple_pod_single<T, V, M> {
-public:
-    bool is_occurs_ok() const { return true; }
-    void swap(ct_simple_pod_optional &ar_other) { ct_simple_pod_single<T, V, M>::swap(ar_other); }
-};
+class ct_simple_pod_optional
+    : public ct_simple_kind<ct_simple_pod_optional<T, V, M>, ct_simple_pod_single<T, V, M>, true> {};
 
 // Values that are expensive to copy (strings, dates, binaries) have the
 // same shape; the names tell the generated code which to use.
 template <typename T, typename V = T, typename M = ct_non_mixed<T>>
-class ct_simple_non_pod_single : public ct_simple_pod_single<T, V, M> {
-public:
-    void swap(ct_simple_non_pod_single &ar_other) { ct_simple_pod_single<T, V, M>::swap(ar_other); }
-};
+class ct_simple_non_pod_single
+    : public ct_simple_kind<ct_simple_non_pod_single<T, V, M>, ct_simple_pod_single<T, V, M>, false> {};
 
 template <typename T, typename V = T, typename M = ct_non_mixed<T>>
-class ct_simple_non_pod_optional : public ct_simple_pod_single<T, V, M> {
-public:
-    bool is_occurs_ok() const { return true; }
-    void swap(ct_simple_non_pod_optional &ar_other) { ct_simple_pod_single<T, V, M>::swap(ar_other); }
-};
+class ct_simple_non_pod_optional
+    : public ct_simple_kind<ct_simple_non_pod_optional<T, V, M>, ct_simple_pod_single<T, V, M>, true> {};
 
 // A list of values held in one text of a required element or attribute. It
 // counts as set once read, or once a value has been put in.
@@ -364,12 +365,11 @@ protected:
 
 // An optional list: never missing; an empty list is not written.
 template <typename T, typename V = T, typename M = ct_non_mixed<T>>
-class ct_simple_pod_list_optional : public ct_simple_pod_list_single<T, V, M> {
+class ct_simple_pod_list_optional
+    : public ct_simple_kind<ct_simple_pod_list_optional<T, V, M>, ct_simple_pod_list_single<T, V, M>, true> {
 public:
-    bool is_occurs_ok() const { return true; }
     bool is_value_set() const override { return !this->m_values.empty(); }
     std::size_t list_count() const override { return this->m_values.empty() ? 0 : 1; }
-    void swap(ct_simple_pod_list_optional &ar_other) { ct_simple_pod_list_single<T, V, M>::swap(ar_other); }
 };
 
 // ---------------------------------------------------------------- complex members

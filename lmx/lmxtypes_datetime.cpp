@@ -439,38 +439,38 @@ void append_zone(std::string &ar_out, bool a_is_utc, std::int32_t a_offset) {
 
 std::string c_datetime_base::p_get_as_string(e_form a_form) const {
     std::string text;
+    // The fields in the order the forms share: year-month[-day], hh:mm:ss.
+    auto year_month = [&] {
+        append_year(text, m_year);
+        text += '-';
+        append_unsigned(text, m_month, 2);
+    };
+    auto date = [&] {
+        year_month();
+        text += '-';
+        append_unsigned(text, m_day, 2);
+    };
+    auto time = [&] {
+        append_unsigned(text, m_hours, 2);
+        text += ':';
+        append_unsigned(text, m_minutes, 2);
+        text += ':';
+        append_seconds(text, m_seconds);
+    };
     switch (a_form) {
     case f_datetime:
-        append_year(text, m_year);
-        text += '-';
-        append_unsigned(text, m_month, 2);
-        text += '-';
-        append_unsigned(text, m_day, 2);
+        date();
         text += 'T';
-        append_unsigned(text, m_hours, 2);
-        text += ':';
-        append_unsigned(text, m_minutes, 2);
-        text += ':';
-        append_seconds(text, m_seconds);
+        time();
         break;
     case f_date:
-        append_year(text, m_year);
-        text += '-';
-        append_unsigned(text, m_month, 2);
-        text += '-';
-        append_unsigned(text, m_day, 2);
+        date();
         break;
     case f_time:
-        append_unsigned(text, m_hours, 2);
-        text += ':';
-        append_unsigned(text, m_minutes, 2);
-        text += ':';
-        append_seconds(text, m_seconds);
+        time();
         break;
     case f_gyearmonth:
-        append_year(text, m_year);
-        text += '-';
-        append_unsigned(text, m_month, 2);
+        year_month();
         break;
     case f_gyear:
         append_year(text, m_year);

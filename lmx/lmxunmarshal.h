@@ -240,69 +240,95 @@ inline elmx_error unmarshal_next_child(c_xml_reader &ar_reader, const s_event_ma
     return elmx_ok;
 }
 
+// One value, or with IsList a list of values, from a text or from the
+// spec's default.
+template <bool IsList, typename Item, typename T>
+elmx_error unmarshal_text_values(c_xml_reader &ar_reader, Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
+                                 const std::string &ar_text) {
+    if constexpr (IsList)
+        return unmarshal_list_values(ar_reader, ar_item, ar_spec, ar_text);
+    return unmarshal_one_value(ar_reader, ar_item, ar_spec, ar_text);
+}
+
+template <bool IsList, typename Item, typename T>
+void unmarshal_default_values(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec) {
+    if constexpr (IsList) {
+        unmarshal_default_list(ar_item, ar_spec);
+    } else {
+        ar_item.mk_new_space();
+        ar_spec.v_to_o(ar_item.get_new_space_value_ref(), ar_spec.get_default());
+    }
+}
+
+// The current attribute's text, read into ar_buffer, as the item's values.
+template <bool IsList, typename Item, typename T>
+elmx_error unmarshal_attribute(c_xml_reader &ar_reader, Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
+                               std::string &ar_buffer) {
+    if (ar_item.is_value_set())
+        if (elmx_error error = ar_reader.handle_attribute_error(elmx_attribute_already_read))
+            return error;
+    if (!ar_reader.get_attribute_value(&ar_buffer, ar_spec.get_whitespace_handling()))
+        return ar_reader.handle_attribute_error(elmx_unable_to_read_attribute);
+    return unmarshal_text_values<IsList>(ar_reader, ar_item, ar_spec, ar_buffer);
+}
+
+// The current element's text, read into ar_buffer, as the item's values; an
+// empty text takes the spec's default, if it has one.
+template <bool IsList, typename Item, typename T>
+elmx_error unmarshal_element(c_xml_reader &ar_reader, Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
+                             std::string &ar_buffer) {
+    if (elmx_error error = unmarshal_element_text(ar_reader, ar_spec.get_whitespace_handling(), &ar_buffer))
+        return error;
+    if (ar_buffer.empty() && !ar_spec.get_default().empty()) {
+        unmarshal_default_values<IsList>(ar_item, ar_spec);
+        return elmx_ok;
+    }
+    return unmarshal_text_values<IsList>(ar_reader, ar_item, ar_spec, ar_buffer);
+}
+
+// A whole child element read as the item's values, then the next event.
+template <bool IsList, typename Item, typename T>
+elmx_error unmarshal_child(c_xml_reader &ar_reader, Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
+                           const s_event_map *ac_event_map) {
+    if (elmx_error error = unmarshal_child_start_tag(ar_reader))
+        return error;
+    if (elmx_error error = unmarshal_element<IsList>(ar_reader, ar_item, ar_spec, ar_reader.get_value_buffer()))
+        return error;
+    return unmarshal_next_child(ar_reader, ac_event_map);
+}
+
 } // namespace detail
 
 template <typename Item, typename T>
 elmx_error c_xml_reader::unmarshal_attribute_value(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec) {
-    if (ar_item.is_value_set())
-        if (elmx_error error = handle_attribute_error(elmx_attribute_already_read))
-            return error;
-    if (!get_attribute_value(&m_value, ar_spec.get_whitespace_handling()))
-        return handle_attribute_error(elmx_unable_to_read_attribute);
-    return detail::unmarshal_one_value(*this, ar_item, ar_spec, m_value);
+    return detail::unmarshal_attribute<false>(*this, ar_item, ar_spec, m_value);
 }
 
 template <typename Item, typename T>
 elmx_error c_xml_reader::unmarshal_attribute_list_value(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec) {
-    if (ar_item.is_value_set())
-        if (elmx_error error = handle_attribute_error(elmx_attribute_already_read))
-            return error;
-    if (!get_attribute_value(&m_value, ar_spec.get_whitespace_handling()))
-        return handle_attribute_error(elmx_unable_to_read_attribute);
-    return detail::unmarshal_list_values(*this, ar_item, ar_spec, m_value);
+    return detail::unmarshal_attribute<true>(*this, ar_item, ar_spec, m_value);
 }
 
 template <typename Item, typename T>
 elmx_error c_xml_reader::unmarshal_element_value(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec) {
-    if (elmx_error error = detail::unmarshal_element_text(*this, ar_spec.get_whitespace_handling(), &m_value))
-        return error;
-    if (m_value.empty() && !ar_spec.get_default().empty()) {
-        ar_item.mk_new_space();
-        ar_spec.v_to_o(ar_item.get_new_space_value_ref(), ar_spec.get_default());
-        return elmx_ok;
-    }
-    return detail::unmarshal_one_value(*this, ar_item, ar_spec, m_value);
+    return detail::unmarshal_element<false>(*this, ar_item, ar_spec, m_value);
 }
 
 template <typename Item, typename T>
 elmx_error c_xml_reader::unmarshal_element_list_value(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec) {
-    if (elmx_error error = detail::unmarshal_element_text(*this, ar_spec.get_whitespace_handling(), &m_value))
-        return error;
-    if (m_value.empty() && !ar_spec.get_default().empty()) {
-        detail::unmarshal_default_list(ar_item, ar_spec);
-        return elmx_ok;
-    }
-    return detail::unmarshal_list_values(*this, ar_item, ar_spec, m_value);
+    return detail::unmarshal_element<true>(*this, ar_item, ar_spec, m_value);
 }
 
 template <typename Item, typename T>
 elmx_error c_xml_reader::unmarshal_child_element(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
                                                  const s_event_map *ac_event_map) {
-    if (elmx_error error = detail::unmarshal_child_start_tag(*this))
-        return error;
-    if (elmx_error error = unmarshal_element_value(ar_item, ar_spec))
-        return error;
-    return detail::unmarshal_next_child(*this, ac_event_map);
+    return detail::unmarshal_child<false>(*this, ar_item, ar_spec, ac_event_map);
 }
 
 template <typename Item, typename T>
 elmx_error c_xml_reader::unmarshal_child_element_list(Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
                                                       const s_event_map *ac_event_map) {
-    if (elmx_error error = detail::unmarshal_child_start_tag(*this))
-        return error;
-    if (elmx_error error = unmarshal_element_list_value(ar_item, ar_spec))
-        return error;
-    return detail::unmarshal_next_child(*this, ac_event_map);
+    return detail::unmarshal_child<true>(*this, ar_item, ar_spec, ac_event_map);
 }
 
 template <typename Item>

@@ -251,6 +251,30 @@ private:
     elmx_error p_check_values(const char *ac_name, const Item &ar_item, const ct_typed_validation_spec<T> &ar_spec);
     template <typename Item, typename T>
     void p_write_list(const Item &ar_item, const ct_typed_validation_spec<T> &ar_spec);
+    // The value of an item, or with a_is_list its one list of values: the
+    // check of a set item, and its text with no markup.
+    template <typename Item, typename T>
+    elmx_error p_check_item(const char *ac_name, const Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
+                            bool a_is_list);
+    template <typename Item, typename T>
+    void p_write_item(const Item &ar_item, const ct_typed_validation_spec<T> &ar_spec, bool a_is_list);
+    // Nothing for an unset item; else the check, then a_frame(write) where
+    // write() puts out the item's text inside the markup a_frame gives it.
+    template <typename Item, typename T, typename Frame>
+    elmx_error p_marshal_item(const char *ac_name, const Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
+                              bool a_is_list, Frame a_frame);
+    // The frames: an attribute, a simple element in a scope of its own, and
+    // the body of the current element.
+    template <typename Write> void p_write_attribute(const char *ac_name, Write a_write);
+    template <typename Write> void p_write_simple_element(const char *ac_name, const s_ns_map *ap_ns_map, Write a_write);
+    template <typename Write> void p_write_body(Write a_write) {
+        prepare_for_simple_body_data();
+        a_write();
+    }
+    // A simple element holding the spec's default text.
+    template <typename T>
+    void p_write_default_element(const char *ac_name, const ct_typed_validation_spec<T> &ar_spec,
+                                 const s_ns_map *ap_ns_map);
     void p_start_simple_element(const char *ac_name, const s_ns_map *ap_ns_map);
     static const c_any_info &p_any(const c_any_info &ar_info) { return ar_info; }
     static const c_any_info &p_any(const c_any_info *ap_info) { return *ap_info; }
@@ -331,17 +355,59 @@ void c_xml_writer::p_write_list(const Item &ar_item, const ct_typed_validation_s
 }
 
 template <typename Item, typename T>
+elmx_error c_xml_writer::p_check_item(const char *ac_name, const Item &ar_item,
+                                      const ct_typed_validation_spec<T> &ar_spec, bool a_is_list) {
+    if (a_is_list)
+        return p_check_values(ac_name, ar_item, ar_spec);
+    return p_check_value<T>(ac_name, ct_marshal_item<Item>::value(ar_item, 0), ar_spec);
+}
+
+template <typename Item, typename T>
+void c_xml_writer::p_write_item(const Item &ar_item, const ct_typed_validation_spec<T> &ar_spec, bool a_is_list) {
+    if (a_is_list)
+        p_write_list(ar_item, ar_spec);
+    else
+        output_value<T>(ct_marshal_item<Item>::value(ar_item, 0), ar_spec);
+}
+
+template <typename Item, typename T, typename Frame>
+elmx_error c_xml_writer::p_marshal_item(const char *ac_name, const Item &ar_item,
+                                        const ct_typed_validation_spec<T> &ar_spec, bool a_is_list,
+                                        Frame a_frame) {
+    if (!ct_marshal_item<Item>::is_value_set(ar_item))
+        return elmx_ok;
+    if (elmx_error error = p_check_item(ac_name, ar_item, ar_spec, a_is_list))
+        return error;
+    a_frame([&] { p_write_item(ar_item, ar_spec, a_is_list); });
+    return elmx_ok;
+}
+
+template <typename Write>
+void c_xml_writer::p_write_attribute(const char *ac_name, Write a_write) {
+    p_open_attribute(ac_name);
+    a_write();
+    p_close_attribute();
+}
+
+template <typename Write>
+void c_xml_writer::p_write_simple_element(const char *ac_name, const s_ns_map *ap_ns_map, Write a_write) {
+    c_xml_writer_local local(*this);
+    p_start_simple_element(ac_name, ap_ns_map);
+    a_write();
+    end_element(ac_name);
+}
+
+template <typename T>
+void c_xml_writer::p_write_default_element(const char *ac_name, const ct_typed_validation_spec<T> &ar_spec,
+                                           const s_ns_map *ap_ns_map) {
+    p_write_simple_element(ac_name, ap_ns_map, [&] { p_write_escaped(ar_spec.get_default()); });
+}
+
+template <typename Item, typename T>
 elmx_error c_xml_writer::marshal_attribute(const char *ac_name, const Item &ar_item,
                                            const ct_typed_validation_spec<T> &ar_spec) {
-    using item = ct_marshal_item<Item>;
-    if (!item::is_value_set(ar_item))
-        return elmx_ok;
-    if (elmx_error error = p_check_value<T>(ac_name, item::value(ar_item, 0), ar_spec))
-        return error;
-    p_open_attribute(ac_name);
-    output_value<T>(item::value(ar_item, 0), ar_spec);
-    p_close_attribute();
-    return elmx_ok;
+    return p_marshal_item(ac_name, ar_item, ar_spec, false,
+                          [&](auto a_write) { p_write_attribute(ac_name, a_write); });
 }
 
 template <typename Item, typename T>
@@ -356,14 +422,8 @@ elmx_error c_xml_writer::marshal_attribute_or_default(const char *ac_name, const
 template <typename Item, typename T>
 elmx_error c_xml_writer::marshal_attribute_list(const char *ac_name, const Item &ar_item,
                                                 const ct_typed_validation_spec<T> &ar_spec) {
-    if (!ct_marshal_item<Item>::is_value_set(ar_item))
-        return elmx_ok;
-    if (elmx_error error = p_check_values(ac_name, ar_item, ar_spec))
-        return error;
-    p_open_attribute(ac_name);
-    p_write_list(ar_item, ar_spec);
-    p_close_attribute();
-    return elmx_ok;
+    return p_marshal_item(ac_name, ar_item, ar_spec, true,
+                          [&](auto a_write) { p_write_attribute(ac_name, a_write); });
 }
 
 template <typename Item, typename T>
@@ -384,10 +444,7 @@ elmx_error c_xml_writer::marshal_element(const char *ac_name, const Item &ar_ite
         const T &value = item::value(ar_item, i);
         if (elmx_error error = p_check_value<T>(ac_name, value, ar_spec))
             return error;
-        c_xml_writer_local local(*this);
-        p_start_simple_element(ac_name, ap_ns_map);
-        output_value<T>(value, ar_spec);
-        end_element(ac_name);
+        p_write_simple_element(ac_name, ap_ns_map, [&] { output_value<T>(value, ar_spec); });
     }
     return elmx_ok;
 }
@@ -398,10 +455,7 @@ elmx_error c_xml_writer::marshal_element_or_default(const char *ac_name, const I
                                                     const s_ns_map *ap_ns_map) {
     if (ct_marshal_item<Item>::is_value_set(ar_item))
         return marshal_element(ac_name, ar_item, ar_spec, ap_ns_map);
-    c_xml_writer_local local(*this);
-    p_start_simple_element(ac_name, ap_ns_map);
-    p_write_escaped(ar_spec.get_default());
-    end_element(ac_name);
+    p_write_default_element(ac_name, ar_spec, ap_ns_map);
     return elmx_ok;
 }
 
@@ -409,15 +463,8 @@ template <typename Item, typename T>
 elmx_error c_xml_writer::marshal_element_list(const char *ac_name, const Item &ar_item,
                                               const ct_typed_validation_spec<T> &ar_spec,
                                               const s_ns_map *ap_ns_map) {
-    if (!ct_marshal_item<Item>::is_value_set(ar_item))
-        return elmx_ok;
-    if (elmx_error error = p_check_values(ac_name, ar_item, ar_spec))
-        return error;
-    c_xml_writer_local local(*this);
-    p_start_simple_element(ac_name, ap_ns_map);
-    p_write_list(ar_item, ar_spec);
-    end_element(ac_name);
-    return elmx_ok;
+    return p_marshal_item(ac_name, ar_item, ar_spec, true,
+                          [&](auto a_write) { p_write_simple_element(ac_name, ap_ns_map, a_write); });
 }
 
 template <typename Item, typename T>
@@ -426,36 +473,20 @@ elmx_error c_xml_writer::marshal_element_list_or_default(const char *ac_name, co
                                                          const s_ns_map *ap_ns_map) {
     if (ct_marshal_item<Item>::is_value_set(ar_item))
         return marshal_element_list(ac_name, ar_item, ar_spec, ap_ns_map);
-    c_xml_writer_local local(*this);
-    p_start_simple_element(ac_name, ap_ns_map);
-    p_write_escaped(ar_spec.get_default());
-    end_element(ac_name);
+    p_write_default_element(ac_name, ar_spec, ap_ns_map);
     return elmx_ok;
 }
 
 template <typename Item, typename T>
 elmx_error c_xml_writer::marshal_element_body(const char *ac_name, const Item &ar_item,
                                               const ct_typed_validation_spec<T> &ar_spec) {
-    using item = ct_marshal_item<Item>;
-    if (!item::is_value_set(ar_item))
-        return elmx_ok;
-    if (elmx_error error = p_check_value<T>(ac_name, item::value(ar_item, 0), ar_spec))
-        return error;
-    prepare_for_simple_body_data();
-    output_value<T>(item::value(ar_item, 0), ar_spec);
-    return elmx_ok;
+    return p_marshal_item(ac_name, ar_item, ar_spec, false, [&](auto a_write) { p_write_body(a_write); });
 }
 
 template <typename Item, typename T>
 elmx_error c_xml_writer::marshal_element_body_list(const char *ac_name, const Item &ar_item,
                                                    const ct_typed_validation_spec<T> &ar_spec) {
-    if (!ct_marshal_item<Item>::is_value_set(ar_item))
-        return elmx_ok;
-    if (elmx_error error = p_check_values(ac_name, ar_item, ar_spec))
-        return error;
-    prepare_for_simple_body_data();
-    p_write_list(ar_item, ar_spec);
-    return elmx_ok;
+    return p_marshal_item(ac_name, ar_item, ar_spec, true, [&](auto a_write) { p_write_body(a_write); });
 }
 
 // ---------------------------------------------------------------- wildcards

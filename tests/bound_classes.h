@@ -9,6 +9,7 @@
 #define TESSARINE_TESTS_BOUND_CLASSES_H
 
 #include <string>
+#include <type_traits>
 
 #include <lmx/lmxparse.h>
 
@@ -118,6 +119,106 @@ inline bool unmarshal_next_event(lmx::c_xml_reader &ar_reader, const lmx::s_even
     if (*ap_error != lmx::elmx_ok && (*ap_error = ar_reader.handle_error(*ap_error)) != lmx::elmx_ok)
         return false;
     return true;
+}
+
+// The reading steps of class X for c_unmarshal_helper, each going to X's own
+// member where X has one: unmarshal_attributes and unmarshal_attributes_check
+// for attributes, unmarshal_body for a simple (SimpleContent) or complex body.
+template <typename X, typename = void> struct has_attribute_steps : std::false_type {};
+template <typename X>
+struct has_attribute_steps<X, std::void_t<decltype(&X::unmarshal_attributes_check)>> : std::true_type {};
+template <typename X, typename = void> struct has_body_step : std::false_type {};
+template <typename X> struct has_body_step<X, std::void_t<decltype(&X::unmarshal_body)>> : std::true_type {};
+
+template <typename X, bool SimpleContent = false> class class_helper : public lmx::c_unmarshal_helper {
+public:
+    class_helper(X *ap_object, lmx::c_xml_reader &ar_reader) : c_unmarshal_helper(ar_reader), p_object(ap_object) {}
+    bool unmarshal_attribute(lmx::elmx_error *ap_error) override {
+        if constexpr (has_attribute_steps<X>::value) {
+            *ap_error = lmx::elmx_ok;
+            return p_object->unmarshal_attributes(ar_reader, ap_error);
+        } else {
+            return c_unmarshal_helper::unmarshal_attribute(ap_error);
+        }
+    }
+    lmx::elmx_error unmarshal_attributes_check() override {
+        if constexpr (has_attribute_steps<X>::value)
+            return p_object->unmarshal_attributes_check(ar_reader);
+        else
+            return c_unmarshal_helper::unmarshal_attributes_check();
+    }
+    bool unmarshal_simple_body(lmx::elmx_error *ap_error) override {
+        if constexpr (SimpleContent)
+            return p_object->unmarshal_body(ar_reader, ap_error);
+        else
+            return c_unmarshal_helper::unmarshal_simple_body(ap_error);
+    }
+    bool unmarshal_complex_body(lmx::elmx_error *ap_error) override {
+        if constexpr (!SimpleContent && has_body_step<X>::value)
+            return p_object->unmarshal_body(ar_reader, ap_error);
+        else
+            return c_unmarshal_helper::unmarshal_complex_body(ap_error);
+    }
+
+private:
+    X *p_object;
+};
+
+// How a class's content is read.
+enum e_content { content_empty, content_simple, content_complex };
+
+// The start of reading class X once its element is found: the element's
+// name becomes the reader's item name, then the content by its kind, with
+// a_line the code line of its reports.
+template <e_content Content, typename X>
+lmx::elmx_error unmarshal_class(X *ap_object, lmx::c_xml_reader &ar_reader, const std::string &ar_name, int a_line,
+                                bool a_body_can_be_empty = false) {
+    ar_reader.set_name(ar_name);
+    class_helper<X, Content == content_simple> h(ap_object, ar_reader);
+    if (a_body_can_be_empty)
+        h.set_body_can_be_empty();
+    if constexpr (Content == content_empty)
+        return h.unmarshal_empty_content(k_source_stem, a_line);
+    else if constexpr (Content == content_simple)
+        return h.unmarshal_simple_content(k_source_stem, a_line);
+    else
+        return h.unmarshal_complex_content(k_source_stem, a_line);
+}
+
+// One case of the attribute switch: the attribute is X's, read it.
+template <typename Item, typename T>
+bool read_attribute(lmx::c_xml_reader &ar_reader, int a_line, Item &ar_item,
+                    const lmx::ct_typed_validation_spec<T> &ar_spec, lmx::elmx_error *ap_error) {
+    ar_reader.set_code_line(a_line);
+    *ap_error = ar_reader.unmarshal_attribute_value(ar_item, ar_spec);
+    return true;
+}
+
+// A plain child that may be left out: read it if it is the current event.
+// False, with the verdict in *ap_error, when reading stops.
+template <typename Item, typename T>
+bool read_optional_child(lmx::c_xml_reader &ar_reader, int a_event, Item &ar_item,
+                         const lmx::ct_typed_validation_spec<T> &ar_spec, const lmx::s_event_map *ac_tail,
+                         int a_line, lmx::elmx_error *ap_error) {
+    if (ar_reader.get_current_event() != a_event)
+        return true;
+    ar_reader.set_code_line(a_line);
+    *ap_error = ar_reader.unmarshal_child_element(ar_item, ar_spec, ac_tail);
+    return *ap_error == lmx::elmx_ok;
+}
+
+// A required plain child: read it if it is the current event, else report
+// it missing; a cleared report goes on with the next child.
+template <typename Item, typename T>
+bool read_required_child(lmx::c_xml_reader &ar_reader, int a_event, Item &ar_item,
+                         const lmx::ct_typed_validation_spec<T> &ar_spec, const lmx::s_event_map *ac_tail,
+                         const char *ac_name, int a_line, lmx::elmx_error *ap_error) {
+    ar_reader.set_code_line(a_line);
+    if (ar_reader.get_current_event() == a_event)
+        *ap_error = ar_reader.unmarshal_child_element(ar_item, ar_spec, ac_tail);
+    else
+        *ap_error = ar_reader.handle_error(lmx::elmx_mandatory_element_missing, ac_name, k_source_stem, a_line);
+    return *ap_error == lmx::elmx_ok;
 }
 
 // Writing any class: nothing at all if a required member is missing; the
@@ -253,21 +354,15 @@ public:
     }
 
     lmx::elmx_error unmarshal(lmx::c_xml_reader &ar_reader, const std::string &ar_name) {
-        ar_reader.set_name(ar_name);
-        helper h(this, ar_reader);
-        return h.unmarshal_empty_content(k_source_stem, 100);
+        return unmarshal_class<content_empty>(this, ar_reader, ar_name, 100);
     }
     bool unmarshal_attributes(lmx::c_xml_reader &ar_reader, lmx::elmx_error *ap_error) {
         ar_reader.tokenise(attr_event_map(), lmx::ea_attribute);
         switch (ar_reader.get_current_event()) {
         case e_Name:
-            ar_reader.set_code_line(101);
-            *ap_error = ar_reader.unmarshal_attribute_value(m_Name, spec_string());
-            return true;
+            return read_attribute(ar_reader, 101, m_Name, spec_string(), ap_error);
         case e_Value:
-            ar_reader.set_code_line(102);
-            *ap_error = ar_reader.unmarshal_attribute_value(m_Value, spec_string());
-            return true;
+            return read_attribute(ar_reader, 102, m_Value, spec_string(), ap_error);
         }
         return false;
     }
@@ -288,19 +383,6 @@ public:
     }
 
 private:
-    class helper : public lmx::c_unmarshal_helper {
-    public:
-        helper(Tag *ap_this, lmx::c_xml_reader &ar_reader) : c_unmarshal_helper(ar_reader), p_this(ap_this) {}
-        bool unmarshal_attribute(lmx::elmx_error *ap_error) override {
-            *ap_error = lmx::elmx_ok;
-            return p_this->unmarshal_attributes(ar_reader, ap_error);
-        }
-        lmx::elmx_error unmarshal_attributes_check() override { return p_this->unmarshal_attributes_check(ar_reader); }
-
-    private:
-        Tag *p_this;
-    };
-
     lmx::ct_simple_non_pod_single<std::wstring> m_Name;
     lmx::ct_simple_non_pod_single<std::wstring> m_Value;
 };
@@ -372,10 +454,7 @@ public:
     }
 
     lmx::elmx_error unmarshal(lmx::c_xml_reader &ar_reader, const std::string &ar_name) {
-        ar_reader.set_name(ar_name);
-        helper h(this, ar_reader);
-        h.set_body_can_be_empty();
-        return h.unmarshal_complex_content(k_source_stem, 200);
+        return unmarshal_class<content_complex>(this, ar_reader, ar_name, 200, true);
     }
     bool unmarshal_attributes(lmx::c_xml_reader &, lmx::elmx_error *) { return false; }
     lmx::elmx_error unmarshal_attributes_check(lmx::c_xml_reader &) { return lmx::elmx_ok; }
@@ -383,28 +462,14 @@ public:
         const lmx::s_event_map *map = elem_event_map();
         *ap_error = lmx::elmx_ok;
         ar_reader.tokenise(map, lmx::ea_element);
-        if (ar_reader.get_current_event() == e_Creator) {
-            ar_reader.set_code_line(201);
-            if ((*ap_error = ar_reader.unmarshal_child_element(m_Creator, spec_string(), map + 0)) != lmx::elmx_ok)
-                return false;
-        }
-        if (ar_reader.get_current_event() == e_CreationDate) {
-            ar_reader.set_code_line(202);
-            if ((*ap_error = ar_reader.unmarshal_child_element(m_CreationDate, spec_datetime(), map + 1)) !=
-                lmx::elmx_ok)
-                return false;
-        }
-        if (ar_reader.get_current_event() == e_Description) {
-            ar_reader.set_code_line(203);
-            if ((*ap_error = ar_reader.unmarshal_child_element(m_Description, spec_string(), map + 2)) !=
-                lmx::elmx_ok)
-                return false;
-        }
-        if (ar_reader.get_current_event() == e_Comment) {
-            ar_reader.set_code_line(204);
-            if ((*ap_error = ar_reader.unmarshal_child_element(m_Comment, spec_string(), map + 3)) != lmx::elmx_ok)
-                return false;
-        }
+        if (!read_optional_child(ar_reader, e_Creator, m_Creator, spec_string(), map + 0, 201, ap_error))
+            return false;
+        if (!read_optional_child(ar_reader, e_CreationDate, m_CreationDate, spec_datetime(), map + 1, 202, ap_error))
+            return false;
+        if (!read_optional_child(ar_reader, e_Description, m_Description, spec_string(), map + 2, 203, ap_error))
+            return false;
+        if (!read_optional_child(ar_reader, e_Comment, m_Comment, spec_string(), map + 3, 204, ap_error))
+            return false;
         while (ar_reader.get_current_event() == e_Tag) {
             ar_reader.set_code_line(205);
             if ((*ap_error = m_Tag.append().unmarshal(ar_reader, ar_reader.get_name())) != lmx::elmx_ok)
@@ -430,23 +495,6 @@ public:
     }
 
 private:
-    class helper : public lmx::c_unmarshal_helper {
-    public:
-        helper(FileInformation *ap_this, lmx::c_xml_reader &ar_reader)
-            : c_unmarshal_helper(ar_reader), p_this(ap_this) {}
-        bool unmarshal_attribute(lmx::elmx_error *ap_error) override {
-            *ap_error = lmx::elmx_ok;
-            return p_this->unmarshal_attributes(ar_reader, ap_error);
-        }
-        lmx::elmx_error unmarshal_attributes_check() override { return p_this->unmarshal_attributes_check(ar_reader); }
-        bool unmarshal_complex_body(lmx::elmx_error *ap_error) override {
-            return p_this->unmarshal_body(ar_reader, ap_error);
-        }
-
-    private:
-        FileInformation *p_this;
-    };
-
     lmx::ct_simple_non_pod_optional<std::wstring> m_Creator;
     lmx::ct_simple_non_pod_optional<lmx::c_datetime> m_CreationDate;
     lmx::ct_simple_non_pod_optional<std::wstring> m_Description;
@@ -521,21 +569,15 @@ public:
     }
 
     lmx::elmx_error unmarshal(lmx::c_xml_reader &ar_reader, const std::string &ar_name) {
-        ar_reader.set_name(ar_name);
-        helper h(this, ar_reader);
-        return h.unmarshal_complex_content(k_source_stem, 300);
+        return unmarshal_class<content_complex>(this, ar_reader, ar_name, 300);
     }
     bool unmarshal_attributes(lmx::c_xml_reader &ar_reader, lmx::elmx_error *ap_error) {
         ar_reader.tokenise(attr_event_map(), lmx::ea_attribute);
         switch (ar_reader.get_current_event()) {
         case e_Name:
-            ar_reader.set_code_line(301);
-            *ap_error = ar_reader.unmarshal_attribute_value(m_Name, spec_string());
-            return true;
+            return read_attribute(ar_reader, 301, m_Name, spec_string(), ap_error);
         case e_ColorSpecification:
-            ar_reader.set_code_line(302);
-            *ap_error = ar_reader.unmarshal_attribute_value(m_ColorSpecification, spec_string());
-            return true;
+            return read_attribute(ar_reader, 302, m_ColorSpecification, spec_string(), ap_error);
         }
         return false;
     }
@@ -548,9 +590,9 @@ public:
         const lmx::s_event_map *map = elem_event_map();
         *ap_error = lmx::elmx_ok;
         ar_reader.tokenise(map, lmx::ea_element);
-        if (!p_read_required(ar_reader, e_L, m_L, spec_double_ge_0(), map + 0, "cc:L", 304, ap_error) ||
-            !p_read_required(ar_reader, e_A, m_A, spec_double(), map + 1, "cc:A", 305, ap_error) ||
-            !p_read_required(ar_reader, e_B, m_B, spec_double(), map + 2, "cc:B", 306, ap_error))
+        if (!read_required_child(ar_reader, e_L, m_L, spec_double_ge_0(), map + 0, "cc:L", 304, ap_error) ||
+            !read_required_child(ar_reader, e_A, m_A, spec_double(), map + 1, "cc:A", 305, ap_error) ||
+            !read_required_child(ar_reader, e_B, m_B, spec_double(), map + 2, "cc:B", 306, ap_error))
             return false;
         return true;
     }
@@ -568,36 +610,6 @@ public:
     }
 
 private:
-    // A required single plain child: read it if it is the current event,
-    // else report it missing; a cleared report goes on with the next row.
-    static bool p_read_required(lmx::c_xml_reader &ar_reader, int a_event,
-                                lmx::ct_simple_pod_single<double> &ar_item,
-                                const lmx::ct_typed_validation_spec<double> &ar_spec, const lmx::s_event_map *ac_tail,
-                                const char *ac_name, int a_line, lmx::elmx_error *ap_error) {
-        ar_reader.set_code_line(a_line);
-        if (ar_reader.get_current_event() == a_event)
-            *ap_error = ar_reader.unmarshal_child_element(ar_item, ar_spec, ac_tail);
-        else
-            *ap_error = ar_reader.handle_error(lmx::elmx_mandatory_element_missing, ac_name, k_source_stem, a_line);
-        return *ap_error == lmx::elmx_ok;
-    }
-
-    class helper : public lmx::c_unmarshal_helper {
-    public:
-        helper(ColorCIELab *ap_this, lmx::c_xml_reader &ar_reader) : c_unmarshal_helper(ar_reader), p_this(ap_this) {}
-        bool unmarshal_attribute(lmx::elmx_error *ap_error) override {
-            *ap_error = lmx::elmx_ok;
-            return p_this->unmarshal_attributes(ar_reader, ap_error);
-        }
-        lmx::elmx_error unmarshal_attributes_check() override { return p_this->unmarshal_attributes_check(ar_reader); }
-        bool unmarshal_complex_body(lmx::elmx_error *ap_error) override {
-            return p_this->unmarshal_body(ar_reader, ap_error);
-        }
-
-    private:
-        ColorCIELab *p_this;
-    };
-
     lmx::ct_simple_non_pod_optional<std::wstring> m_Name;
     lmx::ct_simple_non_pod_single<std::wstring> m_ColorSpecification;
     lmx::ct_simple_pod_single<double> m_L;
@@ -647,21 +659,15 @@ public:
     }
 
     lmx::elmx_error unmarshal(lmx::c_xml_reader &ar_reader, const std::string &ar_name) {
-        ar_reader.set_name(ar_name);
-        helper h(this, ar_reader);
-        return h.unmarshal_simple_content(k_source_stem, 400);
+        return unmarshal_class<content_simple>(this, ar_reader, ar_name, 400);
     }
     bool unmarshal_attributes(lmx::c_xml_reader &ar_reader, lmx::elmx_error *ap_error) {
         ar_reader.tokenise(attr_event_map(), lmx::ea_attribute);
         switch (ar_reader.get_current_event()) {
         case e_StartWL:
-            ar_reader.set_code_line(401);
-            *ap_error = ar_reader.unmarshal_attribute_value(m_StartWL, spec_ushort_360_400());
-            return true;
+            return read_attribute(ar_reader, 401, m_StartWL, spec_ushort_360_400(), ap_error);
         case e_ColorSpecification:
-            ar_reader.set_code_line(402);
-            *ap_error = ar_reader.unmarshal_attribute_value(m_ColorSpecification, spec_string());
-            return true;
+            return read_attribute(ar_reader, 402, m_ColorSpecification, spec_string(), ap_error);
         }
         return false;
     }
@@ -685,23 +691,6 @@ public:
     }
 
 private:
-    class helper : public lmx::c_unmarshal_helper {
-    public:
-        helper(ReflectanceSpectrum *ap_this, lmx::c_xml_reader &ar_reader)
-            : c_unmarshal_helper(ar_reader), p_this(ap_this) {}
-        bool unmarshal_attribute(lmx::elmx_error *ap_error) override {
-            *ap_error = lmx::elmx_ok;
-            return p_this->unmarshal_attributes(ar_reader, ap_error);
-        }
-        lmx::elmx_error unmarshal_attributes_check() override { return p_this->unmarshal_attributes_check(ar_reader); }
-        bool unmarshal_simple_body(lmx::elmx_error *ap_error) override {
-            return p_this->unmarshal_body(ar_reader, ap_error);
-        }
-
-    private:
-        ReflectanceSpectrum *p_this;
-    };
-
     lmx::ct_simple_pod_optional<unsigned short> m_StartWL;
     lmx::ct_simple_non_pod_single<std::wstring> m_ColorSpecification;
     lmx::ct_simple_pod_list_single<double> m_value;
@@ -745,10 +734,7 @@ public:
     }
 
     lmx::elmx_error unmarshal(lmx::c_xml_reader &ar_reader, const std::string &ar_name) {
-        ar_reader.set_name(ar_name);
-        helper h(this, ar_reader);
-        h.set_body_can_be_empty();
-        return h.unmarshal_complex_content(k_source_stem, 500);
+        return unmarshal_class<content_complex>(this, ar_reader, ar_name, 500, true);
     }
     bool unmarshal_body(lmx::c_xml_reader &ar_reader, lmx::elmx_error *ap_error) {
         const lmx::s_event_map *map = elem_event_map();
@@ -769,17 +755,6 @@ public:
     }
 
 private:
-    class helper : public lmx::c_unmarshal_helper {
-    public:
-        helper(Node *ap_this, lmx::c_xml_reader &ar_reader) : c_unmarshal_helper(ar_reader), p_this(ap_this) {}
-        bool unmarshal_complex_body(lmx::elmx_error *ap_error) override {
-            return p_this->unmarshal_body(ar_reader, ap_error);
-        }
-
-    private:
-        Node *p_this;
-    };
-
     lmx::ct_complex_optional<Node> m_Node;
 };
 

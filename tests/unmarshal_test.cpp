@@ -53,13 +53,33 @@ TEST(UnmarshalEmptyContent, AcceptsSeparateEndTag) {
     EXPECT_EQ(read(tag, "<cc:Tag " + k_ns + " Name=\"a\" Value=\"b\">\n</cc:Tag>"), lmx::elmx_ok);
 }
 
-TEST(UnmarshalEmptyContent, ContentIsBadEndOfElement) {
-    cc::Tag tag;
-    lmx::s_debug_error debug;
-    EXPECT_EQ(read(tag, "<cc:Tag " + k_ns + " Name=\"a\" Value=\"b\"><cc:X/></cc:Tag>", &debug),
-              lmx::elmx_bad_end_of_element);
-    EXPECT_EQ(debug.item_name, "cc:Tag");
+// Each row is one read of cc:Tag that fails: its verdict and the item of
+// the debug record.
+TEST(UnmarshalEmptyContent, ErrorsNameTheItem) {
+    struct s_row {
+        const char *name;
+        std::string text;
+        elmx_error error;
+        const char *item;
+    };
+    const s_row rows[] = {
+        {"content is bad end of element", "<cc:Tag " + k_ns + " Name=\"a\" Value=\"b\"><cc:X/></cc:Tag>",
+         lmx::elmx_bad_end_of_element, "cc:Tag"},
+        {"repeated attribute is already read", "<cc:Tag " + k_ns + " Name=\"a\" Name=\"c\" Value=\"b\"/>",
+         lmx::elmx_attribute_already_read, "@Name"},
+        {"xsi prefix without declaration is unexpected",
+         "<cc:Tag " + k_ns + " xsi:schemaLocation=\"a b\" Name=\"a\" Value=\"b\"/>", lmx::elmx_unexpected_attribute,
+         "@xsi:schemaLocation"},
+    };
+    for (const s_row &row : rows) {
+        SCOPED_TRACE(row.name);
+        cc::Tag tag;
+        lmx::s_debug_error debug;
+        EXPECT_EQ(read(tag, row.text, &debug), row.error);
+        EXPECT_EQ(debug.item_name, row.item);
+    }
 }
+
 
 TEST(UnmarshalAttributes, UnknownAttributeIsReportedWithAtAndName) {
     cc::Tag tag;
@@ -72,13 +92,6 @@ TEST(UnmarshalAttributes, UnknownAttributeIsReportedWithAtAndName) {
     EXPECT_EQ(debug.prog_line, 100);
 }
 
-TEST(UnmarshalAttributes, RepeatedAttributeIsAlreadyRead) {
-    cc::Tag tag;
-    lmx::s_debug_error debug;
-    EXPECT_EQ(read(tag, "<cc:Tag " + k_ns + " Name=\"a\" Name=\"c\" Value=\"b\"/>", &debug),
-              lmx::elmx_attribute_already_read);
-    EXPECT_EQ(debug.item_name, "@Name");
-}
 
 TEST(UnmarshalAttributes, XsiAttributesAreDroppedSilently) {
     cc::Tag tag;
@@ -92,13 +105,6 @@ TEST(UnmarshalAttributes, XsiAttributesAreDroppedSilently) {
               lmx::elmx_ok);
 }
 
-TEST(UnmarshalAttributes, XsiPrefixWithoutDeclarationIsUnexpected) {
-    cc::Tag tag;
-    lmx::s_debug_error debug;
-    EXPECT_EQ(read(tag, "<cc:Tag " + k_ns + " xsi:schemaLocation=\"a b\" Name=\"a\" Value=\"b\"/>", &debug),
-              lmx::elmx_unexpected_attribute);
-    EXPECT_EQ(debug.item_name, "@xsi:schemaLocation");
-}
 
 TEST(UnmarshalAttributes, MissingRequiredAttributeNamesTheClass) {
     cc::Tag tag;
@@ -313,46 +319,44 @@ TEST(UnmarshalColorCIELab, ReadsValues) {
     EXPECT_TRUE(value.is_occurs_ok());
 }
 
-TEST(UnmarshalColorCIELab, NegativeLIsBelowMinimum) {
-    cc::ColorCIELab value;
-    lmx::s_debug_error debug;
-    EXPECT_EQ(read(value, lab("<cc:L>-0.5</cc:L><cc:A>0</cc:A><cc:B>0</cc:B>"), &debug), lmx::elmx_value_below_minimum);
-    EXPECT_EQ(debug.item_name, "cc:L");
-    EXPECT_EQ(read(value, lab("<cc:L>0</cc:L><cc:A>-0.5</cc:A><cc:B>0</cc:B>")), lmx::elmx_ok);
-}
-
-TEST(UnmarshalColorCIELab, TextThatIsNoNumberIsInvalidFormat) {
-    cc::ColorCIELab value;
-    lmx::s_debug_error debug;
-    EXPECT_EQ(read(value, lab("<cc:L>abc</cc:L><cc:A>0</cc:A><cc:B>0</cc:B>"), &debug), lmx::elmx_invalid_value_format);
-    EXPECT_EQ(debug.item_name, "cc:L");
-    EXPECT_EQ(read(value, lab("<cc:L/><cc:A>0</cc:A><cc:B>0</cc:B>")), lmx::elmx_invalid_value_format);
-}
-
-TEST(UnmarshalColorCIELab, MissingRequiredChildIsMandatoryElementMissing) {
-    cc::ColorCIELab value;
-    lmx::s_debug_error debug;
-    EXPECT_EQ(read(value, lab("<cc:A>0</cc:A><cc:B>0</cc:B>"), &debug), lmx::elmx_mandatory_element_missing);
-    EXPECT_EQ(debug.item_name, "cc:L");
-    EXPECT_EQ(read(value, lab("<cc:L>1</cc:L><cc:A>0</cc:A>"), &debug), lmx::elmx_mandatory_element_missing);
-    EXPECT_EQ(debug.item_name, "cc:B");
-}
-
-TEST(UnmarshalColorCIELab, EmptyElementWithRequiredContentIsUnexpectedEmpty) {
-    cc::ColorCIELab value;
-    lmx::s_debug_error debug;
-    EXPECT_EQ(read(value, "<cc:ColorCIELab " + k_ns + " ColorSpecification=\"cs\"/>", &debug),
-              lmx::elmx_unexpected_empty_element);
-    EXPECT_EQ(debug.item_name, "cc:ColorCIELab");
-    EXPECT_EQ(read(value, lab("")), lmx::elmx_unexpected_empty_element);
-}
-
-TEST(UnmarshalColorCIELab, MissingColorSpecificationIsRequiredAttributeMissing) {
-    cc::ColorCIELab value;
-    lmx::s_debug_error debug;
-    EXPECT_EQ(read(value, lab("<cc:L>1</cc:L><cc:A>0</cc:A><cc:B>0</cc:B>", ""), &debug),
-              lmx::elmx_required_attribute_missing);
-    EXPECT_EQ(debug.item_name, "ColorCIELab");
+// Each row is one read: its verdict, and where a row names one, the item
+// of the debug record.
+TEST(UnmarshalColorCIELab, ErrorsNameTheItem) {
+    struct s_row {
+        const char *name;
+        std::string text;
+        elmx_error error;
+        const char *item; // null: no debug record asked for
+    };
+    const s_row rows[] = {
+        {"negative L is below minimum", lab("<cc:L>-0.5</cc:L><cc:A>0</cc:A><cc:B>0</cc:B>"),
+         lmx::elmx_value_below_minimum, "cc:L"},
+        {"negative A has no minimum", lab("<cc:L>0</cc:L><cc:A>-0.5</cc:A><cc:B>0</cc:B>"), lmx::elmx_ok, nullptr},
+        {"text that is no number is invalid format", lab("<cc:L>abc</cc:L><cc:A>0</cc:A><cc:B>0</cc:B>"),
+         lmx::elmx_invalid_value_format, "cc:L"},
+        {"empty number is invalid format", lab("<cc:L/><cc:A>0</cc:A><cc:B>0</cc:B>"),
+         lmx::elmx_invalid_value_format, nullptr},
+        {"missing first child is mandatory element missing", lab("<cc:A>0</cc:A><cc:B>0</cc:B>"),
+         lmx::elmx_mandatory_element_missing, "cc:L"},
+        {"missing last child is mandatory element missing", lab("<cc:L>1</cc:L><cc:A>0</cc:A>"),
+         lmx::elmx_mandatory_element_missing, "cc:B"},
+        {"empty element with required content is unexpected empty",
+         "<cc:ColorCIELab " + k_ns + " ColorSpecification=\"cs\"/>", lmx::elmx_unexpected_empty_element,
+         "cc:ColorCIELab"},
+        {"element with no content is unexpected empty", lab(""), lmx::elmx_unexpected_empty_element, nullptr},
+        {"missing ColorSpecification is required attribute missing",
+         lab("<cc:L>1</cc:L><cc:A>0</cc:A><cc:B>0</cc:B>", ""), lmx::elmx_required_attribute_missing,
+         "ColorCIELab"},
+    };
+    for (const s_row &row : rows) {
+        SCOPED_TRACE(row.name);
+        cc::ColorCIELab value;
+        lmx::s_debug_error debug;
+        EXPECT_EQ(read(value, row.text, row.item ? &debug : nullptr), row.error);
+        if (row.item) {
+            EXPECT_EQ(debug.item_name, row.item);
+        }
+    }
 }
 
 TEST(UnmarshalColorCIELab, ForgivenMissingChildGoesOnWithNextRow) {

@@ -5,10 +5,12 @@
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
+#include <initializer_list>
 #include <limits>
 #include <locale>
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -239,31 +241,31 @@ TEST(writer_layout, empty_strings_put_the_whole_document_on_one_line) {
                         "<t:r xmlns:t=\"http://example.com/test\" " + std::string(k_xsi) + " a=\"1\"><t:c/></t:r>");
 }
 
-TEST(writer_layout, attribute_tab_alone_separates_attributes_on_one_line) {
+// An empty element (e unless named) with the attributes given, under the
+// layout strings given.
+std::string element_with_attributes(const char *ap_tab, const char *ap_nl, const char *ap_attribute_tab,
+                                    const char *ap_attribute_nl,
+                                    std::initializer_list<std::pair<const char *, const char *>> a_attributes,
+                                    const char *ac_element = "e") {
     std::ostringstream os;
-    c_xml_writer writer(os, "\t", "\n", "  ", "");
+    c_xml_writer writer(os, ap_tab, ap_nl, ap_attribute_tab, ap_attribute_nl);
     {
         c_xml_writer_local local(writer);
-        writer.start_element("e");
-        writer.marshal_attribute("x", "1");
-        writer.marshal_attribute("y", "2");
-        writer.marshal_attribute("z", "3");
-        writer.end_element("e");
+        writer.start_element(ac_element);
+        for (const auto &attribute : a_attributes)
+            writer.marshal_attribute(attribute.first, attribute.second);
+        writer.end_element(ac_element);
     }
-    EXPECT_EQ(os.str(), "<e x=\"1\"  y=\"2\"  z=\"3\"/>\n");
+    return os.str();
+}
+
+TEST(writer_layout, attribute_tab_alone_separates_attributes_on_one_line) {
+    EXPECT_EQ(element_with_attributes("\t", "\n", "  ", "", {{"x", "1"}, {"y", "2"}, {"z", "3"}}),
+              "<e x=\"1\"  y=\"2\"  z=\"3\"/>\n");
 }
 
 TEST(writer_layout, attribute_newline_alone_starts_each_further_attribute_on_a_new_line) {
-    std::ostringstream os;
-    c_xml_writer writer(os, "\t", "\n", "", "\n");
-    {
-        c_xml_writer_local local(writer);
-        writer.start_element("e");
-        writer.marshal_attribute("x", "1");
-        writer.marshal_attribute("y", "2");
-        writer.end_element("e");
-    }
-    EXPECT_EQ(os.str(), "<e x=\"1\"\ny=\"2\"/>\n");
+    EXPECT_EQ(element_with_attributes("\t", "\n", "", "\n", {{"x", "1"}, {"y", "2"}}), "<e x=\"1\"\ny=\"2\"/>\n");
 }
 
 TEST(writer_layout, further_attributes_stand_two_tabs_deeper_than_their_tag) {
@@ -312,16 +314,7 @@ TEST(writer_layout, custom_strings_replace_tab_and_newline) {
 }
 
 TEST(writer_layout, null_attribute_strings_follow_the_given_element_strings) {
-    std::ostringstream os;
-    c_xml_writer writer(os, "-", "|");
-    {
-        c_xml_writer_local local(writer);
-        writer.start_element("e");
-        writer.marshal_attribute("x", "1");
-        writer.marshal_attribute("y", "2");
-        writer.end_element("e");
-    }
-    EXPECT_EQ(os.str(), "<e x=\"1\"|--y=\"2\"/>|");
+    EXPECT_EQ(element_with_attributes("-", "|", nullptr, nullptr, {{"x", "1"}, {"y", "2"}}), "<e x=\"1\"|--y=\"2\"/>|");
 }
 
 TEST(writer_layout, simple_value_stands_between_its_tags_on_one_line) {
@@ -464,15 +457,8 @@ TEST(writer_layout, constant_forms_escape_their_text) {
 }
 
 TEST(writer_layout, xsi_nil_is_written_by_the_constant_attribute_form) {
-    std::ostringstream os;
-    c_xml_writer writer(os);
-    {
-        c_xml_writer_local local(writer);
-        writer.start_element("t:Density");
-        writer.marshal_attribute("xsi:nil", "true");
-        writer.end_element("t:Density");
-    }
-    EXPECT_EQ(os.str(), "<t:Density xsi:nil=\"true\"/>\n");
+    EXPECT_EQ(element_with_attributes(nullptr, nullptr, nullptr, nullptr, {{"xsi:nil", "true"}}, "t:Density"),
+              "<t:Density xsi:nil=\"true\"/>\n");
 }
 
 TEST(writer_layout, writer_imbues_the_classic_locale) {
@@ -635,32 +621,29 @@ TEST(writer_namespaces, added_namespaces_follow_the_selected_table) {
                         "\t\txmlns=\"urn:plain\"/>\n");
 }
 
-TEST(writer_namespaces, schema_locations_are_written_in_pairs) {
+// An empty element e under the given schema locations, as uri and location pairs.
+std::string element_with_schema_locations(std::initializer_list<std::pair<const char *, const char *>> a_locations) {
     std::ostringstream os;
     c_xml_writer writer(os, "\t", "\n", "", "");
-    writer.add_schema_location("urn:a", "a.xsd");
-    writer.add_schema_location("urn:b", "b.xsd");
+    for (const auto &location : a_locations)
+        writer.add_schema_location(location.first, location.second);
     {
         c_xml_writer_local local(writer);
         writer.start_element("e");
         writer.conditionally_write_ns_attrs(false);
         writer.end_element("e");
     }
-    EXPECT_EQ(os.str(), "<e " + std::string(k_xsi) + " xsi:schemaLocation=\"urn:a a.xsd urn:b b.xsd\"/>\n");
+    return os.str();
+}
+
+TEST(writer_namespaces, schema_locations_are_written_in_pairs) {
+    EXPECT_EQ(element_with_schema_locations({{"urn:a", "a.xsd"}, {"urn:b", "b.xsd"}}),
+              "<e " + std::string(k_xsi) + " xsi:schemaLocation=\"urn:a a.xsd urn:b b.xsd\"/>\n");
 }
 
 TEST(writer_namespaces, first_location_without_uri_gives_no_namespace_schema_location_alone) {
-    std::ostringstream os;
-    c_xml_writer writer(os, "\t", "\n", "", "");
-    writer.add_schema_location("", "plain.xsd");
-    writer.add_schema_location("urn:b", "b.xsd");
-    {
-        c_xml_writer_local local(writer);
-        writer.start_element("e");
-        writer.conditionally_write_ns_attrs(false);
-        writer.end_element("e");
-    }
-    EXPECT_EQ(os.str(), "<e " + std::string(k_xsi) + " xsi:noNamespaceSchemaLocation=\"plain.xsd\"/>\n");
+    EXPECT_EQ(element_with_schema_locations({{"", "plain.xsd"}, {"urn:b", "b.xsd"}}),
+              "<e " + std::string(k_xsi) + " xsi:noNamespaceSchemaLocation=\"plain.xsd\"/>\n");
 }
 
 TEST(writer_namespaces, only_the_first_selected_table_counts) {
