@@ -81,6 +81,11 @@ std::size_t short_decimal_to_chars(char *ap_buffer, double a_value) {
     double magnitude = std::fabs(a_value);
     if (!(magnitude >= 1e-4 && magnitude < k_max_digits_value))
         return 0;
+    // A decimal of up to 8 places shows as a near-whole value at 8 places:
+    // one look rules out values of many digits before the search.
+    double probe = magnitude * k_powers_of_ten[8];
+    if (probe < k_max_digits_value && std::fabs(probe - std::floor(probe + 0.5)) > 1e-9 * probe)
+        return 0;
     for (int places = 0; places < 9; ++places) {
         double scaled = magnitude * k_powers_of_ten[places];
         if (scaled >= k_max_digits_value)
