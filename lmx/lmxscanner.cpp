@@ -11,31 +11,26 @@ namespace {
 
 std::string describe(int a_c) { return a_c == -1 ? std::string("end of input") : std::string(1, static_cast<char>(a_c)); }
 
-// Stop tables for the bulk paths: a byte whose entry is 1 needs the careful
-// path. Every table stops at NUL, line ends and bytes of 0x80 and up.
-struct s_stop_tables {
-    unsigned char text[256];       // character data: "<", "&"
-    unsigned char text_white[256]; // character data where white space is folded
-    unsigned char name[256];       // anything that is not a name character
+// Where a run of character data whose white space is folded must stop: at
+// "<", "&", white space, and what needs the careful path (NUL, line ends,
+// bytes of 0x80 and up).
+struct s_folded_text_table {
+    unsigned char stops[256];
 
-    s_stop_tables() : text(), text_white(), name() {
-        for (int c = 0; c < 256; ++c) {
-            bool careful = c == 0 || c == '\r' || c == '\n' || c >= 0x80;
-            text[c] = careful || c == '<' || c == '&';
-            text_white[c] = text[c] || is_white(c);
-            name[c] = careful || !is_xml_name_char(c);
-        }
+    s_folded_text_table() : stops() {
+        for (int c = 0; c < 256; ++c)
+            stops[c] = c == 0 || c >= 0x80 || c == '<' || c == '&' || is_white(c);
     }
 };
 
-const s_stop_tables k_tables;
+const s_folded_text_table k_folded_text_table;
 
 // Runs of character data, of names and of quoted values.
-const s_run_stops k_text_stops = {k_tables.text, '<', '&'};
-const s_run_stops k_folded_text_stops = {k_tables.text_white, 0, 0};
-const s_run_stops k_name_stops = {k_tables.name, 0, 0};
-const s_run_stops k_double_quoted_stops = {nullptr, '"', '"'};
-const s_run_stops k_single_quoted_stops = {nullptr, '\'', '\''};
+const s_run_stops k_text_stops = {nullptr, '<', '&', false};
+const s_run_stops k_folded_text_stops = {k_folded_text_table.stops, 0, 0, false};
+const s_run_stops k_name_stops = {nullptr, 0, 0, true};
+const s_run_stops k_double_quoted_stops = {nullptr, '"', '"', false};
+const s_run_stops k_single_quoted_stops = {nullptr, '\'', '\'', false};
 
 // White space is folded in every mode but ws_preserve.
 const s_run_stops &text_stops(elmx_whitespace a_mode) {
@@ -43,7 +38,6 @@ const s_run_stops &text_stops(elmx_whitespace a_mode) {
 }
 
 } // namespace
-
 
 c_xml::c_xml(c_read &ar_reader, c_error &ar_error, bool a_is_reading_xsd)
     : c_get_for_xml(ar_reader, ar_error, a_is_reading_xsd), m_dtd(*this) {}

@@ -133,7 +133,8 @@ enum e_encoding_mode {
     mode_ucs2_le = 6
 };
 
-// Where a run of plain bytes taken in bulk ends. With first set, at first or
+// Where a run of plain bytes taken in bulk ends. With is_name, at the first
+// byte that is not an ASCII name character; with first set, at first or
 // second; otherwise at every byte whose entry in p_table is not 0. Either way
 // a run ends at NUL, at a line end and at bytes of 0x80 and up, which need
 // the careful path for decoding, folding and counting: tables must say so.
@@ -141,6 +142,7 @@ struct s_run_stops {
     const unsigned char *p_table;
     unsigned char first;
     unsigned char second;
+    bool is_name;
 };
 
 // Encodes one code point into a buffer of at least 5 bytes, NUL-terminated.
@@ -264,13 +266,46 @@ inline const unsigned char *find_run_end(const unsigned char *ap_p, const unsign
     return ap_p;
 }
 
+// The first byte from ap_p on that is not an ASCII letter, digit, "_", ":",
+// "." or "-"; ap_end if there is none. Sixteen bytes at a time where the
+// processor allows.
+inline const unsigned char *find_name_end(const unsigned char *ap_p, const unsigned char *ap_end) {
+#ifdef __SSE2__
+    auto in_range = [](__m128i a_x, char a_low, char a_high) {
+        // Signed comparison: bytes of 0x80 and up are negative and never in range.
+        return _mm_and_si128(_mm_cmpgt_epi8(a_x, _mm_set1_epi8(static_cast<char>(a_low - 1))),
+                             _mm_cmplt_epi8(a_x, _mm_set1_epi8(static_cast<char>(a_high + 1))));
+    };
+    while (ap_end - ap_p >= 16) {
+        __m128i x = _mm_loadu_si128(reinterpret_cast<const __m128i *>(ap_p));
+        __m128i name = _mm_or_si128(in_range(_mm_or_si128(x, _mm_set1_epi8(0x20)), 'a', 'z'), in_range(x, '0', '9'));
+        name = _mm_or_si128(name, in_range(x, '-', '.'));
+        name = _mm_or_si128(name, _mm_or_si128(_mm_cmpeq_epi8(x, _mm_set1_epi8('_')),
+                                               _mm_cmpeq_epi8(x, _mm_set1_epi8(':'))));
+        int mask = ~_mm_movemask_epi8(name) & 0xFFFF;
+        if (mask)
+            return ap_p + __builtin_ctz(static_cast<unsigned>(mask));
+        ap_p += 16;
+    }
+#endif
+    auto is_name_byte = [](unsigned char c) {
+        return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') || c == '_' || c == ':' ||
+               c == '.' || c == '-';
+    };
+    while (ap_p != ap_end && is_name_byte(*ap_p))
+        ++ap_p;
+    return ap_p;
+}
+
 inline std::size_t c_get_as_utf8::take_raw_run(const s_run_stops &ar_stops, std::string &ar_out) {
     if (!p_is_plain_state())
         return 0;
     const unsigned char *begin = ar_reader.buffered_begin();
     const unsigned char *end = ar_reader.buffered_end();
     const unsigned char *p = begin;
-    if (ar_stops.first) {
+    if (ar_stops.is_name) {
+        p = find_name_end(p, end);
+    } else if (ar_stops.first) {
         p = find_run_end(p, end, ar_stops.first, ar_stops.second);
     } else {
         const unsigned char *stop = ar_stops.p_table;
