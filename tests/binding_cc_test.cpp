@@ -8,9 +8,12 @@
 
 #include <cxf/v3/cxf3.h>
 
+#include "bound_reads.h"
+
 namespace {
 
 using lmx::elmx_error;
+using tessarine_test::read;
 
 const std::string k_ns = std::string("xmlns:cc=\"") + cc::k_namespace_uri + "\"";
 const std::string k_prolog = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n";
@@ -29,11 +32,6 @@ const std::string k_written = k_prolog + "<cc:FileInformation xmlns:cc=\"" + cc:
                               "\t<cc:Tag Name=\"n2\"\n"
                               "\t\t\tValue=\"v2\"/>\n"
                               "</cc:FileInformation>\n";
-
-template <typename T> elmx_error read(T &ar_object, const std::string &ar_xml, lmx::s_debug_error *ap_debug = nullptr) {
-    ar_object.reset();
-    return lmx::unmarshal(ar_object, ar_xml, ap_debug);
-}
 
 TEST(BindingCcFileInformation, ReadsChildrenAndTags) {
     const std::string text = "<cc:FileInformation " + k_ns +
@@ -125,15 +123,9 @@ TEST(BindingCcFileInformation, EmptyElementIsAccepted) {
 // Each row is one read that fails: its verdict and the item of the debug
 // record.
 TEST(BindingCcFileInformation, ErrorPaths) {
-    struct s_row {
-        const char *name;
-        std::string text;
-        elmx_error error;
-        const char *item;
-    };
     const std::string open = "<cc:FileInformation " + k_ns + ">";
     const std::string close = "</cc:FileInformation>";
-    const s_row rows[] = {
+    const tessarine_test::s_read_row rows[] = {
         {"tag without Name", open + "<cc:Tag Value=\"v\"/>" + close, lmx::elmx_required_attribute_missing, "Tag"},
         {"tag without Value", open + "<cc:Tag Name=\"n\"/>" + close, lmx::elmx_required_attribute_missing, "Tag"},
         {"unknown child", open + "<cc:Creator>a</cc:Creator><cc:Unknown/>" + close, lmx::elmx_bad_end_of_element,
@@ -148,13 +140,7 @@ TEST(BindingCcFileInformation, ErrorPaths) {
          lmx::elmx_bad_end_of_element, "cc:Tag"},
         {"other root", "<cc:Tag " + k_ns + " Name=\"n\" Value=\"v\"/>", lmx::elmx_element_not_found, "cc:Tag"},
     };
-    for (const s_row &row : rows) {
-        SCOPED_TRACE(row.name);
-        cc::FileInformation info;
-        lmx::s_debug_error debug;
-        EXPECT_EQ(read(info, row.text, &debug), row.error);
-        EXPECT_EQ(debug.item_name, row.item);
-    }
+    tessarine_test::expect_reads<cc::FileInformation>(rows);
 }
 
 TEST(BindingCcTag, MissingRequiredAttributeIsNotWritten) {

@@ -12,6 +12,7 @@
 #include <lmx/lmxparse.h>
 
 #include "bound_classes.h"
+#include "bound_reads.h"
 
 namespace {
 
@@ -31,13 +32,6 @@ public:
     explicit c_owning_reader(const std::string &ar_text) : c_text_holder{ar_text}, c_xml_reader_memory(m_text) {}
 };
 
-// Reads into a fresh object: a bound object remembers what it has read, and
-// would refuse the same attribute a second time.
-template <typename T> elmx_error read(T &ar_object, const std::string &ar_xml, lmx::s_debug_error *ap_debug = nullptr) {
-    ar_object.reset();
-    return lmx::unmarshal(ar_object, ar_xml, ap_debug);
-}
-
 // ---------------------------------------------------------------- empty content: cc:Tag
 
 TEST(UnmarshalEmptyContent, ReadsRequiredAttributesInAnyOrder) {
@@ -56,13 +50,7 @@ TEST(UnmarshalEmptyContent, AcceptsSeparateEndTag) {
 // Each row is one read of cc:Tag that fails: its verdict and the item of
 // the debug record.
 TEST(UnmarshalEmptyContent, ErrorsNameTheItem) {
-    struct s_row {
-        const char *name;
-        std::string text;
-        elmx_error error;
-        const char *item;
-    };
-    const s_row rows[] = {
+    const tessarine_test::s_read_row rows[] = {
         {"content is bad end of element", "<cc:Tag " + k_ns + " Name=\"a\" Value=\"b\"><cc:X/></cc:Tag>",
          lmx::elmx_bad_end_of_element, "cc:Tag"},
         {"repeated attribute is already read", "<cc:Tag " + k_ns + " Name=\"a\" Name=\"c\" Value=\"b\"/>",
@@ -71,13 +59,7 @@ TEST(UnmarshalEmptyContent, ErrorsNameTheItem) {
          "<cc:Tag " + k_ns + " xsi:schemaLocation=\"a b\" Name=\"a\" Value=\"b\"/>", lmx::elmx_unexpected_attribute,
          "@xsi:schemaLocation"},
     };
-    for (const s_row &row : rows) {
-        SCOPED_TRACE(row.name);
-        cc::Tag tag;
-        lmx::s_debug_error debug;
-        EXPECT_EQ(read(tag, row.text, &debug), row.error);
-        EXPECT_EQ(debug.item_name, row.item);
-    }
+    tessarine_test::expect_reads<cc::Tag>(rows);
 }
 
 
@@ -322,13 +304,7 @@ TEST(UnmarshalColorCIELab, ReadsValues) {
 // Each row is one read: its verdict, and where a row names one, the item
 // of the debug record.
 TEST(UnmarshalColorCIELab, ErrorsNameTheItem) {
-    struct s_row {
-        const char *name;
-        std::string text;
-        elmx_error error;
-        const char *item; // null: no debug record asked for
-    };
-    const s_row rows[] = {
+    const tessarine_test::s_read_row rows[] = {
         {"negative L is below minimum", lab("<cc:L>-0.5</cc:L><cc:A>0</cc:A><cc:B>0</cc:B>"),
          lmx::elmx_value_below_minimum, "cc:L"},
         {"negative A has no minimum", lab("<cc:L>0</cc:L><cc:A>-0.5</cc:A><cc:B>0</cc:B>"), lmx::elmx_ok, nullptr},
@@ -348,15 +324,7 @@ TEST(UnmarshalColorCIELab, ErrorsNameTheItem) {
          lab("<cc:L>1</cc:L><cc:A>0</cc:A><cc:B>0</cc:B>", ""), lmx::elmx_required_attribute_missing,
          "ColorCIELab"},
     };
-    for (const s_row &row : rows) {
-        SCOPED_TRACE(row.name);
-        cc::ColorCIELab value;
-        lmx::s_debug_error debug;
-        EXPECT_EQ(read(value, row.text, row.item ? &debug : nullptr), row.error);
-        if (row.item) {
-            EXPECT_EQ(debug.item_name, row.item);
-        }
-    }
+    tessarine_test::expect_reads<cc::ColorCIELab>(rows);
 }
 
 TEST(UnmarshalColorCIELab, ForgivenMissingChildGoesOnWithNextRow) {
