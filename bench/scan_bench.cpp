@@ -3,49 +3,17 @@
 // its own, so that its peak memory is its own; the best of several runs counts.
 //
 // usage: scan_bench [OBJECTS] [RUNS]   (defaults: 100000 objects, 5 runs)
-#include <sys/resource.h>
-#include <sys/wait.h>
-#include <unistd.h>
-
-#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <string>
 
+#include "bench/bench_process.h"
 #include "bench/cxf_generator.h"
 #include "tools/xml_walk.h"
 
-namespace {
-
-struct run_figures {
-    double seconds = 0;   // best wall time, 0 before the first run
-    long peak_rss_kb = 0; // largest peak resident set of any run
-    bool ok = true;
-};
-
-// Runs a_child once in a forked process and folds its figures in.
-template <typename F> void measure_once(run_figures *ap_figures, F a_child) {
-    std::fflush(nullptr);
-    auto start = std::chrono::steady_clock::now();
-    pid_t pid = fork();
-    if (pid == 0)
-        _exit(a_child());
-    int status = 0;
-    rusage usage{};
-    wait4(pid, &status, 0, &usage);
-    double seconds = std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-    ap_figures->ok = ap_figures->ok && WIFEXITED(status) && WEXITSTATUS(status) == 0;
-    ap_figures->seconds = ap_figures->seconds == 0 ? seconds : std::min(ap_figures->seconds, seconds);
-    ap_figures->peak_rss_kb = std::max(ap_figures->peak_rss_kb, usage.ru_maxrss);
-}
-
-void print(const char *ap_name, const run_figures &ar_figures, double a_megabytes) {
-    std::printf("%-28s %8.1f MB/s  %7.3f s  peak RSS %7.1f MB%s\n", ap_name, a_megabytes / ar_figures.seconds,
-                ar_figures.seconds, ar_figures.peak_rss_kb / 1024.0, ar_figures.ok ? "" : "  (FAILED)");
-}
-
-} // namespace
+using tessarine_bench::measure_once;
+using tessarine_bench::run_figures;
 
 int main(int argc, char **argv) {
     int objects = argc > 1 ? std::atoi(argv[1]) : 100000;
@@ -75,8 +43,8 @@ int main(int argc, char **argv) {
         });
     }
 
-    print("lmx reader (full walk)", lmx_scan, megabytes);
-    print("xmllint --noout --stream", xmllint, megabytes);
+    tessarine_bench::print_figures("lmx reader (full walk)", lmx_scan, megabytes);
+    tessarine_bench::print_figures("xmllint --noout --stream", xmllint, megabytes);
     double ratio = xmllint.seconds / lmx_scan.seconds;
     std::printf("ratio lmx / xmllint: %.2fx (target at least 1.5x)\n", ratio);
     std::filesystem::remove(path);
