@@ -193,46 +193,26 @@ public:
     }
 };
 
-class c_marshalable {
-public:
-    virtual ~c_marshalable() = default;
-};
+// The two shapes of a simple member, as tags. The reader and the writer
+// reach a member through templates on its concrete type, so the members
+// below are not virtual: a bound object carries no table pointer per value.
+//
+// A member holding values of T read as V (the same type, or c_any_info for
+// wildcards) has is_in_mixed, is_value_set, mk_new_space (room for one more
+// value, marking the member set), get_new_space_text_ref,
+// get_new_space_value_ref, count, access_text and access_value.
+//
+// A member holding one list of values in one text has the same, and
+// start_new_list (empties the list and marks the member set),
+// new_list_size and list_count (lists held: one, or none); count and
+// access_value are about the values in the list.
+class c_marshalable {};
 
 class c_marshalable_simple : public c_marshalable {};
 
-// What the reader fills and the writer reads, for a member holding values of
-// T read as V (the same type, or c_any_info for wildcards).
-template <typename T, typename V = T> class cit_marshalable_simple : public c_marshalable_simple {
-public:
-    virtual bool is_in_mixed() const = 0;
-    virtual bool is_value_set() const = 0;
-    // Makes room for one more value and marks the member as set.
-    virtual void mk_new_space() = 0;
-    virtual std::string &get_new_space_text_ref() = 0;
-    virtual T &get_new_space_value_ref() = 0;
-    virtual std::size_t count() const = 0;
-    virtual const std::string &access_text(std::size_t a_index) const = 0;
-    virtual const T &access_value(std::size_t a_index) const = 0;
-};
+template <typename T, typename V = T> class cit_marshalable_simple : public c_marshalable_simple {};
 
-// The same for a member that holds one list of values in one text.
-template <typename T, typename V = T> class cit_marshalable_simple_list : public c_marshalable_simple {
-public:
-    virtual bool is_in_mixed() const = 0;
-    virtual bool is_value_set() const = 0;
-    // Empties the list and marks the member as set.
-    virtual void start_new_list() = 0;
-    virtual std::string &get_new_space_text_ref() = 0;
-    virtual void mk_new_space() = 0;
-    virtual T &get_new_space_value_ref() = 0;
-    virtual std::size_t new_list_size() const = 0;
-    // Lists held: one, or none.
-    virtual std::size_t list_count() const = 0;
-    virtual const std::string &access_text(std::size_t a_index) const = 0;
-    // Values in the list.
-    virtual std::size_t count() const = 0;
-    virtual const T &access_value(std::size_t a_index) const = 0;
-};
+template <typename T, typename V = T> class cit_marshalable_simple_list : public c_marshalable_simple {};
 
 // ---------------------------------------------------------------- simple members
 
@@ -267,14 +247,14 @@ public:
         swap(m_is_set, ar_other.m_is_set);
     }
 
-    bool is_in_mixed() const override { return M::is_in_mixed(); }
-    bool is_value_set() const override { return m_is_set; }
-    void mk_new_space() override { m_is_set = true; }
-    std::string &get_new_space_text_ref() override { return M::unused_text(); }
-    T &get_new_space_value_ref() override { return m_value; }
-    std::size_t count() const override { return m_is_set ? 1 : 0; }
-    const std::string &access_text(std::size_t) const override { return M::unused_text(); }
-    const T &access_value(std::size_t) const override { return m_value; }
+    bool is_in_mixed() const { return M::is_in_mixed(); }
+    bool is_value_set() const { return m_is_set; }
+    void mk_new_space() { m_is_set = true; }
+    std::string &get_new_space_text_ref() { return M::unused_text(); }
+    T &get_new_space_value_ref() { return m_value; }
+    std::size_t count() const { return m_is_set ? 1 : 0; }
+    const std::string &access_text(std::size_t) const { return M::unused_text(); }
+    const T &access_value(std::size_t) const { return m_value; }
 
 private:
     T m_value;
@@ -329,6 +309,9 @@ public:
     void clear() { m_values.clear(); }
     std::size_t size() const { return m_values.size(); }
     bool empty() const { return m_values.empty(); }
+    // Room for a_count values, so that a list read item by item is held
+    // without spare capacity.
+    void reserve(std::size_t a_count) { m_values.raw_container().reserve(a_count); }
     void unset() {
         m_values.clear();
         m_is_set = false;
@@ -340,23 +323,23 @@ public:
         std::swap(m_is_set, ar_other.m_is_set);
     }
 
-    bool is_in_mixed() const override { return M::is_in_mixed(); }
-    bool is_value_set() const override { return m_is_set; }
-    void start_new_list() override {
+    bool is_in_mixed() const { return M::is_in_mixed(); }
+    bool is_value_set() const { return m_is_set; }
+    void start_new_list() {
         m_values.clear();
         m_is_set = true;
     }
-    std::string &get_new_space_text_ref() override { return M::unused_text(); }
-    void mk_new_space() override {
+    std::string &get_new_space_text_ref() { return M::unused_text(); }
+    void mk_new_space() {
         m_values.push_back(T());
         m_is_set = true;
     }
-    T &get_new_space_value_ref() override { return m_values.back(); }
-    std::size_t new_list_size() const override { return m_values.size(); }
-    std::size_t list_count() const override { return m_is_set ? 1 : 0; }
-    const std::string &access_text(std::size_t) const override { return M::unused_text(); }
-    std::size_t count() const override { return m_values.size(); }
-    const T &access_value(std::size_t a_index) const override { return m_values[a_index]; }
+    T &get_new_space_value_ref() { return m_values.back(); }
+    std::size_t new_list_size() const { return m_values.size(); }
+    std::size_t list_count() const { return m_is_set ? 1 : 0; }
+    const std::string &access_text(std::size_t) const { return M::unused_text(); }
+    std::size_t count() const { return m_values.size(); }
+    const T &access_value(std::size_t a_index) const { return m_values[a_index]; }
 
 protected:
     ct_pod_container<T> m_values;
@@ -368,8 +351,8 @@ template <typename T, typename V = T, typename M = ct_non_mixed<T>>
 class ct_simple_pod_list_optional
     : public ct_simple_kind<ct_simple_pod_list_optional<T, V, M>, ct_simple_pod_list_single<T, V, M>, true> {
 public:
-    bool is_value_set() const override { return !this->m_values.empty(); }
-    std::size_t list_count() const override { return this->m_values.empty() ? 0 : 1; }
+    bool is_value_set() const { return !this->m_values.empty(); }
+    std::size_t list_count() const { return this->m_values.empty() ? 0 : 1; }
 };
 
 // ---------------------------------------------------------------- complex members

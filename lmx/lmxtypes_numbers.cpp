@@ -223,7 +223,9 @@ bool is_valid_integer(const std::string &ar_text) {
 }
 
 bool is_valid_float(const std::string &ar_text) {
-    if (ar_text == "INF" || ar_text == "-INF" || ar_text == "NaN")
+    // The three special forms, looked at only when the first byte allows.
+    const char first = ar_text.empty() ? '\0' : ar_text[0];
+    if ((first == 'I' || first == '-' || first == 'N') && (ar_text == "INF" || ar_text == "-INF" || ar_text == "NaN"))
         return true;
     const char *p = ar_text.c_str();
     skip_opt_sign(p);
@@ -241,12 +243,15 @@ bool is_valid_float(const std::string &ar_text) {
 // ---------------------------------------------------------------- numbers as text
 
 double atofloat(const char *ap_text) {
-    if (std::strcmp(ap_text, "NaN") == 0)
-        return 0.0 / float_zero();
-    if (std::strcmp(ap_text, "INF") == 0)
-        return 1.0 / float_zero();
-    if (std::strcmp(ap_text, "-INF") == 0)
-        return -1.0 / float_zero();
+    const char first = ap_text[0];
+    if (first == 'N' || first == 'I' || first == '-') {
+        if (std::strcmp(ap_text, "NaN") == 0)
+            return 0.0 / float_zero();
+        if (std::strcmp(ap_text, "INF") == 0)
+            return 1.0 / float_zero();
+        if (std::strcmp(ap_text, "-INF") == 0)
+            return -1.0 / float_zero();
+    }
     // from_chars knows no locale and no leading "+". Where it reads the whole
     // text it gives what atof gives in the C locale; anything else (a hex
     // form, an overflow, trailing text) takes the slow road.

@@ -183,10 +183,23 @@ elmx_error unmarshal_one_value(c_xml_reader &ar_reader, Item &ar_item, const ct_
     return ar_spec.is_value_valid(ar_reader, value);
 }
 
+// The number of whitespace-separated items of a list text.
+inline std::size_t count_list_items(const std::string &ar_text) {
+    std::size_t count = 0;
+    bool in_item = false;
+    for (char c : ar_text) {
+        const bool is_space = c == ' ' || c == '\t' || c == '\n' || c == '\r';
+        count += !is_space && !in_item;
+        in_item = !is_space;
+    }
+    return count;
+}
+
 template <typename Item, typename T>
 elmx_error unmarshal_list_values(c_xml_reader &ar_reader, Item &ar_item, const ct_typed_validation_spec<T> &ar_spec,
                                  const std::string &ar_text) {
     ar_item.start_new_list();
+    ar_item.reserve(count_list_items(ar_text));
     c_xml_list_tokeniser tokens(ar_text);
     std::string token;
     while (tokens.get(&token))

@@ -346,7 +346,7 @@ class Generator:
 
     def choice_private(self, c):
         typedefs = ['    typedef %s t_%s;' % (self.container_type(a), a.name) for a in c.alts]
-        return ['    // The containers of the alternatives.'] + typedefs + [
+        return ['    // What holds each alternative: the object itself, a run of them, or a value.'] + typedefs + [
                 '',
                 '    // The chosen alternative\'s container, made when it is chosen.',
                 '    template <typename Container> Container &p_select(elmx_chosen a_chosen) {',
@@ -760,7 +760,8 @@ class Generator:
         if a.is_any:
             return 'lmx::ct_simple_non_pod_single<lmx::c_any_info>'
         if a.is_complex:
-            return 'lmx::ct_complex_%s<%s>' % ('multi' if a.repeated else 'single', a.content)
+            # A single one is held as the object itself.
+            return 'lmx::ct_complex_multi<%s>' % a.content if a.repeated else a.content
         v = a.content
         return 'lmx::ct_simple_%s_single<%s>' % ('pod' if v.pod else 'non_pod', v.cpp_type)
 
@@ -808,12 +809,9 @@ class Generator:
                         '}', '']
             elif a.is_complex:
                 e = a.content
-                out += ['%s &%s::get_%s() { return p_select<%s>(%s).get(); }' % (e, n, x, t, k), '',
-                        'const %s *%s::get_%s() const {' % (e, n, x),
-                        '    const %s *p_item = p_chosen<%s>(%s);' % (t, t, k),
-                        '    return p_item ? p_item->get() : nullptr;',
-                        '}', '',
-                        'void %s::assign_%s(const %s &ar_item) { p_select<%s>(%s).assign(ar_item); }'
+                out += ['%s &%s::get_%s() { return p_select<%s>(%s); }' % (e, n, x, t, k), '',
+                        'const %s *%s::get_%s() const { return p_chosen<%s>(%s); }' % (e, n, x, t, k), '',
+                        'void %s::assign_%s(const %s &ar_item) { p_select<%s>(%s) = ar_item; }'
                         % (n, x, e, t, k), '']
             else:
                 v = a.content
@@ -865,8 +863,7 @@ class Generator:
                         '                return error;',
                         '        return lmx::elmx_ok;']
             elif a.is_complex:
-                out += ['        if (!chosen.get())', '            return lmx::elmx_marshal_occurs_error;',
-                        '        return chosen.get()->marshal(ar_writer, %s);' % name]
+                out += ['        return chosen.marshal(ar_writer, %s);' % name]
             else:
                 out += ['        return ar_writer.marshal_element(%s, chosen, %s(), nullptr);' % (name, a.content.spec)]
             out.append('    }')
@@ -891,7 +888,7 @@ class Generator:
                         '        return true;']
             elif a.is_complex:
                 out += call('        return read_class_child',
-                            ['ar_reader', 'p_select<%s>(%s).get()' % (t, k), 'map', str(site), 'ap_error'], ';', 0)
+                            ['ar_reader', 'p_select<%s>(%s)' % (t, k), 'map', str(site), 'ap_error'], ';', 0)
             else:
                 out += ['        ar_reader.set_code_line(%d);' % site]
                 out += call('        *ap_error = ar_reader.unmarshal_child_element',
@@ -956,7 +953,7 @@ class Generator:
             t, k = self.alternative_container(a), chosen_constant(a)
             out += ['    case e_%s:' % a.name,
                     '        ar_reader.set_code_line(%d);' % self.next_site(),
-                    '        return p_select<%s>(%s).get().unmarshal(ar_reader, ar_reader.get_name());' % (t, k)]
+                    '        return p_select<%s>(%s).unmarshal(ar_reader, ar_reader.get_name());' % (t, k)]
         out += ['    }',
                 '    return ar_reader.handle_error(lmx::elmx_element_not_found, ar_reader.get_name(), k_source_stem, %d);'
                 % self.next_site(),
