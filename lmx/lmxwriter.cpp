@@ -330,9 +330,75 @@ void c_xml_writer::marshal_element(const char *ac_name, const char *ac_text) {
     end_element(ac_name);
 }
 
+namespace {
+
+bool is_xml_space(char a_c) { return a_c == ' ' || a_c == '\t' || a_c == '\n' || a_c == '\r'; }
+
+// Does the start tag declare this attribute (xmlns or xmlns:p) itself.
+bool declares(const std::string &ar_start_tag, const std::string &ar_attribute) {
+    for (std::size_t at = ar_start_tag.find(ar_attribute); at != std::string::npos;
+         at = ar_start_tag.find(ar_attribute, at + 1)) {
+        std::size_t end = at + ar_attribute.size();
+        while (end < ar_start_tag.size() && is_xml_space(ar_start_tag[end]))
+            ++end;
+        if (at > 0 && is_xml_space(ar_start_tag[at - 1]) && end < ar_start_tag.size() && ar_start_tag[end] == '=')
+            return true;
+    }
+    return false;
+}
+
+} // namespace
+
+void c_xml_writer::p_declare_attribute_namespace(const c_any_info &ar_info) {
+    const std::string &name = ar_info.get_name();
+    const std::size_t colon = name.find(':');
+    const std::string &ns = ar_info.get_namespace();
+    if (colon == std::string::npos || ns.empty() || ns == c_xml::k_non_namespace || name.compare(0, colon, "xmlns") == 0)
+        return;
+    const std::string prefix = name.substr(0, colon);
+    const char *p_known = get_namespace_prefix(ns);
+    if (p_known && prefix == p_known)
+        return;
+    position_attribute();
+    p_write("xmlns:", 6);
+    p_write(prefix);
+    p_write("=\"", 2);
+    p_write_escaped(ns);
+    p_write('"');
+}
+
 void c_xml_writer::write_any_info(const c_any_info &ar_info) {
     p_write_tabs(m_indent);
-    p_write(ar_info.get_value());
+    const std::string &value = ar_info.get_value();
+    const c_namespace_context &context = ar_info.get_namespace_context();
+    std::size_t name_end = 1;
+    while (name_end < value.size() && !is_xml_space(value[name_end]) && value[name_end] != '/' &&
+           value[name_end] != '>')
+        ++name_end;
+    if (value.empty() || value[0] != '<' || context.size() == 0) {
+        p_write(value);
+        p_write(m_nl);
+        return;
+    }
+    // The element was captured with the prefixes in scope where it stood;
+    // those it uses and does not declare itself are declared on its start
+    // tag, so that it means here what it meant there.
+    const std::string start_tag = value.substr(0, value.find('>'));
+    const bool has_prefix = value.find(':') < name_end;
+    p_write(value.data(), name_end);
+    for (std::size_t i = 0; i < context.size(); ++i) {
+        const std::string &prefix = context.get_ns_prefix(i);
+        const bool is_used = prefix.empty() ? !has_prefix : value.find(prefix + ":") != std::string::npos;
+        const std::string attribute = prefix.empty() ? "xmlns" : "xmlns:" + prefix;
+        if (!is_used || declares(start_tag, attribute))
+            continue;
+        p_write(' ');
+        p_write(attribute);
+        p_write("=\"", 2);
+        p_write_escaped(context.get_ns_uri(i));
+        p_write('"');
+    }
+    p_write(value.data() + name_end, value.size() - name_end);
     p_write(m_nl);
 }
 

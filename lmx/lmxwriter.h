@@ -243,6 +243,9 @@ private:
     void p_write(const char *ap_text);
     void p_write_tabs(int a_count);
     void p_write_escaped(const std::string &ar_text);
+    // Declares the prefix of a kept attribute of another namespace, unless
+    // the writer's own tables give that prefix to that namespace.
+    void p_declare_attribute_namespace(const c_any_info &ar_info);
     void p_open_attribute(const char *ac_name);
     void p_close_attribute() { p_write('"'); }
     template <typename T>
@@ -494,6 +497,7 @@ elmx_error c_xml_writer::marshal_element_body_list(const char *ac_name, const It
 template <typename Store> void c_xml_writer::marshal_any_attribute(const Store &ar_store) {
     for (std::size_t i = 0; i < ar_store.size(); ++i) {
         const c_any_info &info = p_any(ar_store[i]);
+        p_declare_attribute_namespace(info);
         p_open_attribute(info.get_name().c_str());
         p_write_escaped(info.get_value());
         p_close_attribute();

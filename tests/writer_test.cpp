@@ -1051,7 +1051,7 @@ TEST(writer_values, member_containers_of_bound_classes_are_written) {
         writer.marshal_any_element(any_content);
         writer.end_element("e");
     }
-    EXPECT_EQ(os.str(), "<e StartWL=\"380\" Name=\"a&amp;b\" x:a=\"1&lt;2\"><l>0.25 0.5</l><s></s><q:X/></e>");
+    EXPECT_EQ(os.str(), "<e StartWL=\"380\" Name=\"a&amp;b\" xmlns:x=\"urn:x\" x:a=\"1&lt;2\"><l>0.25 0.5</l><s></s><q:X/></e>");
 }
 
 // ------------------------------------------------------------------ refused values
@@ -1204,7 +1204,7 @@ TEST(writer_wildcards, any_attributes_are_written_with_escaped_values) {
         writer.marshal_any_attribute(store);
         writer.end_element("e");
     }
-    EXPECT_EQ(os.str(), "<e plain=\"a&lt;b&amp;&quot;c&quot;\"\n\t\tx:qualified=\"]]&gt;\"/>\n");
+    EXPECT_EQ(os.str(), "<e plain=\"a&lt;b&amp;&quot;c&quot;\"\n\t\txmlns:x=\"urn:x\"\n\t\tx:qualified=\"]]&gt;\"/>\n");
 }
 
 TEST(writer_wildcards, any_attributes_may_be_held_by_pointer) {

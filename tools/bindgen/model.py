@@ -83,7 +83,10 @@ def value_kind(word, enums):
     item = word[5:] if is_list else word
     if item in SCALARS:
         cpp_type, pod, whitespace, lexical = SCALARS[item]
-        kind = ValueKind(word, cpp_type, pod, whitespace, lexical)
+        # A facet checked on the text is checked again on the value, so that
+        # a value set through an accessor is refused on writing as well.
+        value_check = 'value_' + lexical[len('lexical_'):] if not lexical.startswith('lmx::') else None
+        kind = ValueKind(word, cpp_type, pod, whitespace, lexical, value_check)
     elif double_bounds(item):
         kind = ValueKind(word, 'double', True, COLLAPSE, 'lmx::lexical_validator_float',
                          'value_' + word_identifier(item))

@@ -111,7 +111,7 @@ class Generator:
         return out
 
     def enum_declaration(self, e):
-        out = ['// %s: 0 for a text that is in no row.' % e.name, 'enum %s {' % e.name,
+        out = ['// %s: 0 for a text that is in no row.' % e.name, 'enum %s : int {' % e.name,
                '    %s_not_set = 0,' % e.name]
         for i, text in enumerate(e.texts, 1):
             out.append('    %s = %d, // "%s"' % (e.constant(text), i, text))
@@ -476,6 +476,28 @@ class Generator:
             result.append((v.lexical, ['// A wavelength from 360 to 400, compared as text before conversion.',
                                        lexical_text % v.lexical,
                                        '    return lmx::check_integer(ar_reader, ar_text, "360", "400");', '}']))
+        value_text = 'lmx::elmx_error %s(lmx::c_xml_reader &ar_reader, const %s &ar_value) {' % (v.value_check,
+                                                                                                 v.cpp_type)
+        if v.value_check == 'value_nonempty':
+            result.append((v.value_check, ['// Not empty, on writing.', value_text,
+                                           '    return lmx::check_facet(ar_reader, !ar_value.empty(), '
+                                           'lmx::elmx_length_too_short);', '}']))
+        elif v.value_check == 'value_nonempty_max1':
+            result.append((v.value_check, ['// One character, on writing.', value_text,
+                                           '    if (ar_value.empty())',
+                                           '        return lmx::check_facet(ar_reader, false, lmx::elmx_length_too_short);',
+                                           '    // A character above U+FFFF is a pair of UTF-16 units.',
+                                           '    const bool is_pair = ar_value.size() == 2 && ar_value[0] >= 0xD800 && '
+                                           'ar_value[0] <= 0xDBFF;',
+                                           '    return lmx::check_facet(ar_reader, ar_value.size() <= 1 || is_pair, '
+                                           'lmx::elmx_length_too_long);', '}']))
+        elif v.value_check == 'value_ushort_360_400':
+            result.append((v.value_check, ['// From 360 to 400, on writing.', value_text,
+                                           '    if (lmx::elmx_error error = lmx::check_facet(ar_reader, ar_value >= 360, '
+                                           'lmx::elmx_value_below_minimum))',
+                                           '        return error;',
+                                           '    return lmx::check_facet(ar_reader, ar_value <= 400, '
+                                           'lmx::elmx_value_above_maximum);', '}']))
         item = v.word[5:] if v.is_list else v.word
         bounds = double_bounds(item)
         if bounds:
