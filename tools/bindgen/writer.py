@@ -651,7 +651,7 @@ class Generator:
         out = ['// ---------------------------------------------------------------- %s' % c.name, '']
         if c.kind == 'derived':
             return out + self.derived_definition(c)
-        if not c.is_group and c.role != 'document':
+        if not c.is_group and c.role != 'document' and self.has_callbacks(c):
             out += self.helper_class(c)
         out += self.lifecycle(c)
         if c.kind == 'choice':
@@ -668,6 +668,11 @@ class Generator:
         rows = c.alts if c.kind == 'choice' else c.element_rows
         out += self.event_map(c.name, 'elem_event_map', self.group.ns_id, [m for m in rows if not m.is_any])
         return out
+
+    def has_callbacks(self, c):
+        """Does the driver call back into the class: a class without any reads
+        with the plain helper."""
+        return self.reads_attributes(c) or bool(c.required_attrs) or self.has_body(c)
 
     def next_site(self):
         self.site += 1
@@ -1071,7 +1076,8 @@ class Generator:
                '    return unmarshal_document(*this, ar_reader);', '}', '',
                'lmx::elmx_error %s::unmarshal(lmx::c_xml_reader &ar_reader, const std::string &ar_name) {' % n,
                '    ar_reader.set_name(ar_name);',
-               '    %s_unmarshal_helper helper(this, ar_reader);' % n]
+               '    %s_unmarshal_helper helper(this, ar_reader);' % n if self.has_callbacks(c) else
+               '    lmx::c_unmarshal_helper helper(ar_reader);']
         if 'any-attributes' in c.flags:
             out.append('    helper.set_anyattributes_store(&m_any_attributes);')
         if c.kind == 'simple':
