@@ -69,10 +69,14 @@ def fold_line(line):
         indent = m.group(1)
         return fold_line(indent + m.group(2) + ' {') + fold_line(indent + '    ' + m.group(3)) + [indent + '}']
     indent = len(line) - len(line.lstrip())
-    opening = line.find('(')
-    column = opening + 1 if 0 < opening < WIDTH // 2 else indent + 8
-    cut = max((line.rfind(b, 0, WIDTH - 1) for b in BREAKS), default=-1)
-    if cut <= column:
+    # The weakest bond first: statements of a for, then && and ||, then
+    # arguments, then the conditional operator.
+    for breaks in (('; ',), (' && ', ' || '), (', ',), (' ? ', ' : ')):
+        cut = max(line.rfind(b, 0, WIDTH - 1) for b in breaks)
+        column = continuation_column(line, cut, indent)
+        if cut > column:
+            break
+    else:
         return [line]
     head, tail = line[:cut], line[cut:]
     if tail.startswith((', ', '; ')):
@@ -80,3 +84,17 @@ def fold_line(line):
     else:
         tail = tail[1:]
     return [head] + fold_line(' ' * column + tail)
+
+
+def continuation_column(line, cut, indent):
+    """Under the innermost parenthesis still open at cut, if that is not too
+    far right; else a double indent."""
+    opened = []
+    for i, c in enumerate(line[:max(cut, 0)]):
+        if c == '(':
+            opened.append(i)
+        elif c == ')' and opened:
+            opened.pop()
+    if opened and opened[-1] + 1 < WIDTH // 2:
+        return opened[-1] + 1
+    return indent + 8

@@ -1147,25 +1147,34 @@ class Generator:
         site = self.next_site()
         if m.kind == 'group':
             following = sum(1 for e in c.elems[:i] if e.kind == 'elem')
-            missing = ['    if (!%s::is_member(ar_reader) && !report_missing_element(ar_reader, "%s", %d, ap_error))'
-                       % (m.content, m.content, site),
-                       '        return false;']
-            if m.repeated:
-                out = (missing if m.required else []) + [
-                    '    while (%s::is_member(ar_reader))' % m.content,
-                    '        if (!m_%s.append().unmarshal(ar_reader, ap_error))' % x,
-                    '            return false;']
+            g = m.content
+            report = ['        if (!report_missing_element(ar_reader, "%s", %d, ap_error))' % (g, site),
+                      '            return false;']
+            if m.repeated and m.required:
+                # Asked once per item: is_member tokenises the current element.
+                out = ['    if (!%s::is_member(ar_reader)) {' % g] + report + [
+                       '    } else {',
+                       '        do',
+                       '            if (!m_%s.append().unmarshal(ar_reader, ap_error))' % x,
+                       '                return false;',
+                       '        while (%s::is_member(ar_reader));' % g,
+                       '    }']
+            elif m.repeated:
+                out = ['    while (%s::is_member(ar_reader))' % g,
+                       '        if (!m_%s.append().unmarshal(ar_reader, ap_error))' % x,
+                       '            return false;']
             elif m.required:
-                out = ['    if (!%s::is_member(ar_reader)) {' % m.content,
-                       '        if (!report_missing_element(ar_reader, "%s", %d, ap_error))' % (m.content, site),
-                       '            return false;',
+                out = ['    if (!%s::is_member(ar_reader)) {' % g] + report + [
                        '    } else if (!m_%s.get().unmarshal(ar_reader, ap_error)) {' % x,
                        '        return false;',
                        '    }']
             else:
-                out = ['    if (%s::is_member(ar_reader) && !m_%s.get().unmarshal(ar_reader, ap_error))' % (m.content, x),
+                out = ['    if (%s::is_member(ar_reader) && !m_%s.get().unmarshal(ar_reader, ap_error))' % (g, x),
                        '        return false;']
+            if i + 1 == len(c.elems):
+                return out
             # The group's own table named the event: the rows after it name it again.
+            following = sum(1 for e in c.elems[:i] if e.kind == 'elem')
             return out + ['    ar_reader.tokenise(map + %d, lmx::ea_element);' % following]
         tail = 'map + %d' % m.map_index
         name = '"%s"' % self.element(x)
