@@ -39,6 +39,16 @@ unsigned index_by_id(std::size_t a_size, const std::wstring &ar_id, Get a_get) {
     return k_not_found;
 }
 
+// The items, among a_size, whose chosen value a_chosen_of(i) is a_chosen.
+template <typename Chosen, typename ChosenOf>
+std::vector<unsigned> indices_of_kind(std::size_t a_size, Chosen a_chosen, ChosenOf a_chosen_of) {
+    std::vector<unsigned> indices;
+    for (std::size_t i = 0; i < a_size; ++i)
+        if (a_chosen_of(i) == a_chosen)
+            indices.push_back(static_cast<unsigned>(i));
+    return indices;
+}
+
 } // namespace
 
 // ---------------------------------------------------------------- loading and saving
@@ -223,21 +233,15 @@ DeviceColorValues CxF::get_DeviceColorValues(unsigned a_object_index) const {
 
 std::vector<unsigned> CxF::indexsOfColorSpace(unsigned a_object_index, inner_ColorValues::elmx_chosen a_chosen) const {
     const ColorValues values = get_ColorValues(a_object_index);
-    std::vector<unsigned> indices;
-    for (std::size_t i = 0; i < values.size_inner_ColorValues(); ++i)
-        if (values.get_inner_ColorValues(i).getchosen() == a_chosen)
-            indices.push_back(static_cast<unsigned>(i));
-    return indices;
+    return indices_of_kind(values.size_inner_ColorValues(), a_chosen,
+                           [&values](std::size_t i) { return values.get_inner_ColorValues(i).getchosen(); });
 }
 
 std::vector<unsigned> CxF::indexsOfColorSpace(unsigned a_object_index,
                                               inner_DeviceColorValues::elmx_chosen a_chosen) const {
     const DeviceColorValues values = get_DeviceColorValues(a_object_index);
-    std::vector<unsigned> indices;
-    for (std::size_t i = 0; i < values.size_inner_DeviceColorValues(); ++i)
-        if (values.get_inner_DeviceColorValues(i).getchosen() == a_chosen)
-            indices.push_back(static_cast<unsigned>(i));
-    return indices;
+    return indices_of_kind(values.size_inner_DeviceColorValues(), a_chosen,
+                           [&values](std::size_t i) { return values.get_inner_DeviceColorValues(i).getchosen(); });
 }
 
 unsigned CxF::indexOfColorSpace(unsigned a_object_index, inner_ColorValues::elmx_chosen a_chosen) const {
@@ -293,10 +297,11 @@ std::string CxF::get_CustomResource(unsigned a_index, std::string a_ns, std::str
 
 std::vector<inner_DeviceColorValues>
 CxF::get_DeviceColorValuesForType(unsigned a_object_index, inner_DeviceColorValues::elmx_chosen a_chosen) const {
-    const DeviceColorValues values = get_DeviceColorValues(a_object_index);
+    const DeviceColorValues &values = *object_at(*this, a_object_index).get_DeviceColorValues();
     std::vector<inner_DeviceColorValues> items;
-    for (unsigned i : indexsOfColorSpace(a_object_index, a_chosen))
-        items.push_back(values.get_inner_DeviceColorValues(i));
+    for (std::size_t i = 0; i < values.size_inner_DeviceColorValues(); ++i)
+        if (values.get_inner_DeviceColorValues(i).getchosen() == a_chosen)
+            items.push_back(values.get_inner_DeviceColorValues(i));
     return items;
 }
 
