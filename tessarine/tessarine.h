@@ -1,11 +1,16 @@
 // Tessarine: reads and writes CxF colour exchange files.
 //
-// Umbrella header. For now it exposes the XML runtime (reader, writer, value
-// types); the CxF3 document classes will be added here as they land.
+// Umbrella header: the CxF3 document classes and the tolerance value. The
+// XML runtime is reached through <lmx/lmxparse.h> and <lmx/lmxtypes.h>, the
+// bound classes of the CxF3 schemas through <cxf/v3/cxf3.h> and its siblings.
 #ifndef TESSARINE_TESSARINE_H
 #define TESSARINE_TESSARINE_H
 
-#include <lmx/lmxparse.h>
-#include <lmx/lmxtypes.h>
+#include <tessarine/CXFTolerance.h>
+#include <tessarine/CxF3.h>
+#include <tessarine/CxF3ColorRecipe.h>
+#include <tessarine/CxF3ColorSpecification.h>
+#include <tessarine/CxF3Object.h>
+#include <tessarine/CxF3Types.h>
 
 #endif // TESSARINE_TESSARINE_H
