@@ -8,12 +8,16 @@
 #define TESSARINE_CXF3_H
 
 #include <tessarine/CxF3ColorSpecification.h>
+#include <tessarine/CxF3Job.h>
+#include <tessarine/CxF3LumiveraLibrary.h>
 #include <tessarine/CxF3Object.h>
+#include <tessarine/ICxF3View.h>
 
 #include <boost/shared_ptr.hpp>
 
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
 class CxF3Wrapper;
@@ -67,6 +71,44 @@ public:
     // A copy of the specification; a handle that refers to none when the id is unknown.
     boost::shared_ptr<CxF3ColorSpecification> GetColorSpecification(const std::string &ar_id) const;
     std::vector<boost::shared_ptr<CxF3ColorSpecification>> GetColorSpecifications();
+
+    // ---- Palettes: named lists of objects, kept in a colour page.
+    // Object types as files spell them, and the names of the group palettes.
+    static const std::string &GetTargetTag();
+    static const std::string &GetReferenceTag();
+    static const std::string &GetTrialTag();
+    static const std::string &GetSampleTag();
+    static const std::string &GetTargetsGroupName();
+    static const std::string &GetReferencesGroupName();
+    static const std::string &GetTrialsGroupName();
+    static const std::string &GetSamplesGroupName();
+
+    typedef std::vector<boost::shared_ptr<CxF3Object>> ObjectList;
+    // A new palette of the objects' ids as they are now; a palette of the
+    // same name is a separate palette.
+    void AddPalette(const std::string &ar_name, ObjectList a_objects);
+    // Targets join the palette "Targets", standards "Standards"; other
+    // objects are left out.
+    void AddStandardPalette(ObjectList a_objects);
+    // Trials join the palette "Trials", samples "Samples".
+    void AddTrialPalette(ObjectList a_objects);
+    // First the group of all objects (named by the file description, or
+    // "Object Collection"), then each palette that has known objects.
+    std::vector<std::pair<std::string, ObjectList>> GetPalettes() const;
+
+    // ---- Jobs, kept as quality control sets.
+    // The document shares the job: series added later are saved too.
+    void AddOstraJob(const boost::shared_ptr<CxF3Job> &ar_job);
+    std::vector<boost::shared_ptr<CxF3Job>> GetJobs() const;
+    // The substrate object whose tag "Job" in the collection "Tags" is the
+    // name; null when there is none.
+    boost::shared_ptr<CxF3Object> GetJobSubstrate(const std::string &ar_name) const;
+
+    // ---- Views: always empty; for arrangements an application adds.
+    const std::vector<boost::shared_ptr<ICxF3View>> &GetViews() const;
+
+    // ---- The branded colour library the file carried; null when none.
+    boost::shared_ptr<CxF3LumiveraLibrary> GetLumiveraLibrary() const;
 
     CxF3Wrapper &GetWrapper() const;
 

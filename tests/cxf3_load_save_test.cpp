@@ -50,11 +50,6 @@ private:
     bool p_had_value = false;
 };
 
-const char *const k_color_page_entry =
-    "<cc:CustomResources><cp:ColorPage xmlns:cp=\"http://colorexchangeformat.com/CxF3-colorpage\" "
-    "Name=\"Book\" NumPages=\"2\"><cp:Page Name=\"Reds\" NumRows=\"1\"><cp:Row Name=\"Row1\" NumColumns=\"2\">"
-    "<cp:Obj Id=\"A\"/><cp:Obj Id=\"B\"/></cp:Row></cp:Page></cp:ColorPage></cc:CustomResources>";
-
 } // namespace
 
 class CxF3SaveTest : public ScratchFolderTest {};
@@ -287,19 +282,6 @@ TEST_F(CxF3SaveTest, LoadKeepsEveryCustomResourceEntryAndSaveWritesThemBack) {
     EXPECT_NE(text.find("<y:Other"), std::string::npos) << text;
 }
 
-TEST_F(CxF3SaveTest, ColorPageEntryIsReadIntoPalettesByItsContent) {
-    boost::shared_ptr<CxF3> document = CxF3::CreateCxF();
-    std::stringstream stream(Cxf3Text("", k_color_page_entry));
-    document->LoadFromStream(stream);
-    const std::vector<CxF3Palette> &palettes = document->GetWrapper().palettes;
-    // NumPages says two: the missing page reads as an empty one.
-    ASSERT_EQ(palettes.size(), 2u);
-    EXPECT_EQ(palettes[0].name, "Reds");
-    EXPECT_EQ(palettes[0].objectIds, (std::vector<std::string>{"A", "B"}));
-    EXPECT_EQ(palettes[1].name, "");
-    EXPECT_TRUE(palettes[1].objectIds.empty());
-}
-
 TEST_F(CxF3SaveTest, ExtensionThatDoesNotParseIsSkipped) {
     const std::string broken =
         "<cc:CustomResources><cp:ColorPage xmlns:cp=\"http://colorexchangeformat.com/CxF3-colorpage\"/>"
@@ -309,34 +291,6 @@ TEST_F(CxF3SaveTest, ExtensionThatDoesNotParseIsSkipped) {
     document->LoadFromStream(stream);
     EXPECT_TRUE(document->GetWrapper().palettes.empty());
     EXPECT_EQ(document->GetObjectById("A")->GetName(), "NA");
-}
-
-TEST_F(CxF3SaveTest, SavingTwiceLeavesTwoColorPageEntries) {
-    boost::shared_ptr<CxF3> document = CxF3::CreateCxF();
-    ASSERT_TRUE(document->AddObject(NamedTarget("Red")));
-    document->GetWrapper().palettes.push_back(CxF3Palette{"Reds", {"O1"}});
-    ASSERT_TRUE(document->SaveCxF(PathOf("twice.cxf")));
-    ASSERT_TRUE(document->SaveCxF(PathOf("twice.cxf")));
-    const std::string text = ReadFile(PathOf("twice.cxf"));
-    EXPECT_EQ(CountOf(text, "<cp:ColorPage "), 2u) << text;
-    EXPECT_EQ(CountOf(text, "<?xml"), 1u) << text;
-    EXPECT_EQ(CountOf(text, "<cp:Row Name=\"Row1\""), 2u) << text;
-}
-
-TEST_F(CxF3SaveTest, ReloadingASavedColorPageGivesEveryPaletteTwice) {
-    boost::shared_ptr<CxF3> document = CxF3::CreateCxF();
-    ASSERT_TRUE(document->AddObject(NamedTarget("Red")));
-    document->GetWrapper().palettes.push_back(CxF3Palette{"Reds", {"O1"}});
-    ASSERT_TRUE(document->SaveCxF(PathOf("first.cxf")));
-
-    boost::shared_ptr<CxF3> second = CxF3::CreateCxF();
-    ASSERT_TRUE(second->LoadCxF(PathOf("first.cxf")));
-    ASSERT_EQ(second->GetWrapper().palettes.size(), 1u);
-    ASSERT_TRUE(second->SaveCxF(PathOf("second.cxf")));
-
-    boost::shared_ptr<CxF3> third = CxF3::CreateCxF();
-    ASSERT_TRUE(third->LoadCxF(PathOf("second.cxf")));
-    EXPECT_EQ(third->GetWrapper().palettes.size(), 2u);
 }
 
 // ---------------------------------------------------------------- file recognition

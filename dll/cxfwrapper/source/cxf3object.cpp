@@ -79,9 +79,7 @@ void CxF3ObjectWrapper::CopyValuesIntoObject() {
 // ---------------------------------------------------------------- handle
 
 boost::shared_ptr<CxF3Object> CxF3Object::CreateCxFObject() {
-    boost::shared_ptr<CxF3ObjectWrapper> wrapper(new CxF3ObjectWrapper());
-    boost::shared_ptr<CxF3ObjectInterface> body(new CxF3ObjectInterface(wrapper));
-    return boost::shared_ptr<CxF3Object>(new CxF3Object(body));
+    return CxF3ObjectInterface::Handle(boost::shared_ptr<CxF3ObjectWrapper>(new CxF3ObjectWrapper()));
 }
 
 const std::string &CxF3Object::GetSampleTypeTag() {

@@ -42,6 +42,12 @@ class CxF3ObjectInterface {
 public:
     explicit CxF3ObjectInterface(const boost::shared_ptr<CxF3ObjectWrapper> &ar_wrapper) : wrapper(ar_wrapper) {}
 
+    // A new public handle on the wrapper (which may be null).
+    static boost::shared_ptr<CxF3Object> Handle(const boost::shared_ptr<CxF3ObjectWrapper> &ar_wrapper) {
+        return boost::shared_ptr<CxF3Object>(
+            new CxF3Object(boost::shared_ptr<CxF3ObjectInterface>(new CxF3ObjectInterface(ar_wrapper))));
+    }
+
     boost::shared_ptr<CxF3ObjectWrapper> wrapper;
 };
 

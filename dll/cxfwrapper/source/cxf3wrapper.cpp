@@ -1,5 +1,6 @@
 #include "cxf3wrapper.h"
 
+#include "cxf3lumiverawrapper.h"
 #include "cxf3text.h"
 
 #include <lmx/lmxparse.h>
@@ -102,54 +103,17 @@ void CxF3Wrapper::ReadExtensions() {
             if (colorPage->unmarshal(text.data(), text.size()) == lmx::elmx_ok)
                 ReadPalettes();
         }
+        // Fandecks need no reading of their own: one is read as the colour
+        // page that it also is.
         if (text.find("CxF3-qualitycontrol") != std::string::npos) {
             qualityControl.reset(new qc::c_QualityControl());
-            qualityControl->unmarshal(text.data(), text.size());
+            if (qualityControl->unmarshal(text.data(), text.size()) == lmx::elmx_ok)
+                ReadJobs();
+        }
+        if (text.find("CxF3-Lumivera_V1") != std::string::npos) {
+            boost::shared_ptr<c_Lumivera> branded(new c_Lumivera());
+            if (branded->unmarshal(text.data(), text.size()) == lmx::elmx_ok)
+                library.reset(new CxF3LumiveraLibraryImpl(branded, shared_from_this()));
         }
     }
-}
-
-void CxF3Wrapper::ReadPalettes() {
-    // The page count comes from NumPages, not from the pages present:
-    // missing pages read as empty ones.
-    const short page_count = colorPage->get_NumPages();
-    for (short number = 0; number < page_count; ++number) {
-        while (colorPage->size_Page() <= static_cast<std::size_t>(number))
-            colorPage->append_Page();
-        const cp::Page &page = colorPage->get_Page(static_cast<std::size_t>(number));
-        CxF3Palette palette;
-        palette.name = ToNarrow(page.get_Name());
-        for (std::size_t row = 0; row < page.size_Row(); ++row)
-            for (std::size_t obj = 0; obj < page.get_Row(row).size_Obj(); ++obj)
-                palette.objectIds.push_back(ToNarrow(page.get_Row(row).get_Obj(obj).get_Id()));
-        palettes.push_back(palette);
-    }
-}
-
-bool CxF3Wrapper::WriteColorPage() {
-    if (palettes.empty())
-        return false;
-    colorPage.reset(new cp::ColorPage());
-    colorPage->set_Name(L"Vantry Palettes");
-    colorPage->set_NumPages(static_cast<short>(palettes.size()));
-    for (const CxF3Palette &palette : palettes) {
-        if (palette.objectIds.empty())
-            continue;
-        cp::Page &page = colorPage->append_Page();
-        page.set_Name(ToWide(palette.name));
-        page.set_NumRows(static_cast<short>(palette.objectIds.size()));
-        for (std::size_t position = 0; position < palette.objectIds.size(); ++position) {
-            cp::Row &row = page.append_Row();
-            row.set_Name(ToWide("Row" + std::to_string(position + 1)));
-            row.set_NumColumns(1);
-            row.append_Obj().set_Id(ToWide(palette.objectIds[position]));
-        }
-    }
-    return colorPage->size_Page() > 0 && colorPage->is_occurs_ok() && StoreExtension(*colorPage);
-}
-
-bool CxF3Wrapper::WriteQualityControl() {
-    qualityControl.reset(new qc::c_QualityControl());
-    qualityControl->set_Name(L"Ostra Jobs");
-    return false;
 }

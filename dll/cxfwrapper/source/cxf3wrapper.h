@@ -11,13 +11,14 @@
 #include <cxf/v3/cxf3_colorpage.h>
 #include <cxf/v3/cxf3_qualitycontrol.h>
 
+#include <boost/enable_shared_from_this.hpp>
 #include <boost/shared_ptr.hpp>
 
 #include <map>
 #include <string>
 #include <vector>
 
-class CxF3QCSetWrapper;
+class CxF3JobWrapper;
 class CxF3LumiveraLibraryImpl;
 class ICxF3View;
 
@@ -27,7 +28,7 @@ struct CxF3Palette {
     std::vector<std::string> objectIds;
 };
 
-class CxF3Wrapper {
+class CxF3Wrapper : public boost::enable_shared_from_this<CxF3Wrapper> {
 public:
     // An empty document whose creator is the default creator.
     CxF3Wrapper();
@@ -46,7 +47,7 @@ public:
     void ReadExtensions();
     // Each gives true when it added an entry to the custom resources.
     bool WriteColorPage();
-    bool WriteQualityControl();
+    bool WriteQualityControl(); // with the jobs, in cxf3job.cpp
     // Appends a marshalled extension document as a new custom resource
     // entry, without its XML declaration; entries already there stay.
     template <typename T> bool StoreExtension(const T &ar_document) {
@@ -57,6 +58,8 @@ public:
 private:
     bool StoreExtensionText(std::string a_text);
     void ReadPalettes();
+    // Rebuilds the jobs from the sets of qualityControl (in cxf3job.cpp).
+    void ReadJobs();
 
 public:
     boost::shared_ptr<cc::CxF> root;
@@ -68,7 +71,7 @@ public:
     boost::shared_ptr<cp::ColorPage> colorPage;
     std::vector<CxF3Palette> palettes;
     boost::shared_ptr<qc::c_QualityControl> qualityControl;
-    std::vector<boost::shared_ptr<CxF3QCSetWrapper>> jobs;
+    std::vector<boost::shared_ptr<CxF3JobWrapper>> jobs;
     // Compared by bytes.
     std::map<std::string, boost::shared_ptr<CxF3ObjectWrapper>> objectsById;
     boost::shared_ptr<CxF3LumiveraLibraryImpl> library;

@@ -14,11 +14,6 @@
 
 namespace {
 
-boost::shared_ptr<CxF3Object> ObjectHandle(const boost::shared_ptr<CxF3ObjectWrapper> &ar_wrapper) {
-    return boost::shared_ptr<CxF3Object>(
-        new CxF3Object(boost::shared_ptr<CxF3ObjectInterface>(new CxF3ObjectInterface(ar_wrapper))));
-}
-
 // The extension is lower-cased from the last dot of the whole path, so a dot
 // in a folder name counts too; a path without a dot gets ".cxf".
 std::string NormaliseSavePath(std::string a_path) {
@@ -140,14 +135,14 @@ bool CxF3::AddObject(const boost::shared_ptr<CxF3Object> &ar_object) {
 const std::vector<boost::shared_ptr<CxF3Object>> &CxF3::GetObjects() {
     if (p_objects.empty())
         for (const boost::shared_ptr<CxF3ObjectWrapper> &wrapper : GetWrapper().objects)
-            p_objects.push_back(ObjectHandle(wrapper));
+            p_objects.push_back(CxF3ObjectInterface::Handle(wrapper));
     return p_objects;
 }
 
 boost::shared_ptr<CxF3Object> CxF3::GetObjectById(const std::string &ar_id) const {
     const auto &by_id = GetWrapper().objectsById;
     const auto found = by_id.find(ar_id);
-    return ObjectHandle(found == by_id.end() ? boost::shared_ptr<CxF3ObjectWrapper>() : found->second);
+    return CxF3ObjectInterface::Handle(found == by_id.end() ? boost::shared_ptr<CxF3ObjectWrapper>() : found->second);
 }
 
 // ---------------------------------------------------------------- colour specifications

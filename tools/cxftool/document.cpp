@@ -1,0 +1,49 @@
+#include "tools/cxftool/document.h"
+
+#include <lmx/lmxerror.h>
+
+namespace cxftool {
+
+namespace {
+
+std::string ErrorReport(lmx::elmx_error a_code, const lmx::s_debug_error &ar_debug) {
+    const std::string code_line = "Error code: " + std::to_string(static_cast<int>(a_code)) + "\n";
+    // A file that cannot be opened leaves the reader's report empty.
+    if (ar_debug.error == lmx::elmx_ok)
+        return code_line + "Error: " + lmx::get_error_description(a_code) + "\n";
+    return code_line + ar_debug.to_string();
+}
+
+} // namespace
+
+bool LoadFile(const std::string &ar_path, LoadedFile &ar_file, std::string &ar_error) {
+    lmx::s_debug_error debug;
+    const lmx::elmx_error code = ar_file.tree.unmarshal(ar_path.c_str(), &debug);
+    if (code != lmx::elmx_ok) {
+        ar_error = ErrorReport(code, debug);
+        return false;
+    }
+    ar_file.document = CxF3::CreateCxF();
+    if (!ar_file.document->LoadCxF(ar_path)) {
+        ar_error = "The document classes could not read the file.\n";
+        return false;
+    }
+    return true;
+}
+
+bool LoadFileOrComplain(const std::string &ar_command, const std::string &ar_path, LoadedFile &ar_file,
+                        std::ostream &ar_err) {
+    std::string error;
+    if (LoadFile(ar_path, ar_file, error))
+        return true;
+    ar_err << "cxftool " << ar_command << ": cannot read " << ar_path << "\n" << error;
+    return false;
+}
+
+std::string Narrow(const std::wstring &ar_text) {
+    std::string text;
+    lmx::convert(text, ar_text);
+    return text;
+}
+
+} // namespace cxftool

@@ -1,0 +1,41 @@
+// Reading a file for the commands.
+//
+// The document classes (CxF3 and its parts) answer for the objects and the
+// colour specifications. The file information (creator, date, description,
+// tags) and the kinds of values an object holds are not shown by those
+// classes, so the commands also read the file into the bound tree of
+// <cxf/v3/cxf3.h>; the same file is read twice.
+#ifndef TESSARINE_TOOLS_CXFTOOL_DOCUMENT_H
+#define TESSARINE_TOOLS_CXFTOOL_DOCUMENT_H
+
+#include <tessarine/CxF3.h>
+
+#include <cxf/v3/cxf3.h>
+
+#include <boost/shared_ptr.hpp>
+
+#include <ostream>
+#include <string>
+
+namespace cxftool {
+
+struct LoadedFile {
+    boost::shared_ptr<CxF3> document;
+    cc::CxF tree;
+};
+
+// Reads the file both ways. False when either cannot read it, with the
+// reason in ar_error: the runtime's report (code, item, XML line) when the
+// XML does not bind.
+bool LoadFile(const std::string &ar_path, LoadedFile &ar_file, std::string &ar_error);
+// LoadFile for a command that needs the file: when it cannot be read, says
+// so on ar_err ("cxftool COMMAND: cannot read FILE" and the reason).
+bool LoadFileOrComplain(const std::string &ar_command, const std::string &ar_path, LoadedFile &ar_file,
+                        std::ostream &ar_err);
+
+// UTF-8 text of the bound tree's UTF-16 strings.
+std::string Narrow(const std::wstring &ar_text);
+
+} // namespace cxftool
+
+#endif // TESSARINE_TOOLS_CXFTOOL_DOCUMENT_H
