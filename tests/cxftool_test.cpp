@@ -1,8 +1,11 @@
 // cxftool: command lines, help, errors, and what info, validate and dump
-// print for the example it writes, for the bundled example and for every
-// file of the shared corpus.
+// print for the example it writes, for the bundled example, for documents
+// with palettes, jobs and a branded library, and for every file of the
+// shared corpus.
 #include "tools/cxftool/cxftool.h"
 #include "tools/cxftool/output.h"
+
+#include <tessarine/CxF3.h>
 
 #include <gtest/gtest.h>
 
@@ -64,6 +67,22 @@ bool HasLine(const std::string &ar_text, const std::string &ar_squeezed_line) {
                        [&](const std::string &ar_line) { return Squeezed(ar_line) == ar_squeezed_line; });
 }
 
+// The squeezed lines of info's section that starts with the line
+// ar_heading: that line and the indented lines after it; empty when there is
+// no such line.
+std::vector<std::string> Section(const std::string &ar_text, const std::string &ar_heading) {
+    const std::vector<std::string> lines = Lines(ar_text);
+    auto line = std::find_if(lines.begin(), lines.end(),
+                             [&](const std::string &ar_line) { return Squeezed(ar_line) == ar_heading; });
+    std::vector<std::string> section;
+    if (line == lines.end())
+        return section;
+    section.push_back(Squeezed(*line));
+    for (++line; line != lines.end() && line->rfind(' ', 0) == 0; ++line)
+        section.push_back(Squeezed(*line));
+    return section;
+}
+
 // The records of CSV text, each a list of fields with the quotes undone. A
 // line break inside quotes belongs to the field.
 std::vector<std::vector<std::string>> CsvRecords(const std::string &ar_text) {
@@ -101,6 +120,79 @@ std::string WriteTextFile(const fs::path &ar_path, const std::string &ar_text) {
     return ar_path.string();
 }
 
+boost::shared_ptr<CxF3Job> NewJob(const std::string &ar_name) {
+    const boost::shared_ptr<CxF3Job> job = CxF3Job::CreateCxFJob();
+    job->SetName(ar_name);
+    return job;
+}
+
+CXFTolerance NewTolerance(CXFToleranceModusType a_mode, float a_limit) {
+    CXFTolerance tolerance;
+    tolerance.SetToleranceModus(a_mode);
+    tolerance.SetV0(a_limit);
+    return tolerance;
+}
+
+// Five objects, four palettes that the file keeps and one that it loses,
+// and two jobs, written through the document classes:
+//   O1 Sky (target), O2 Sky trial, O3 Moss (target), O4 Moss trial,
+//   O5 Moss trial 2.
+std::string WritePalettesAndJobs(const fs::path &ar_path) {
+    const boost::shared_ptr<CxF3> document = CxF3::CreateCxF();
+    document->SetFileInformationDescription("Sky and moss");
+    CxF3::ObjectList objects;
+    for (const auto &[name, type] : std::vector<std::pair<std::string, CxF3ObjectType>>{
+             {"Sky", CxF3ObjectTarget},
+             {"Sky trial", CxF3ObjectTrial},
+             {"Moss", CxF3ObjectTarget},
+             {"Moss trial", CxF3ObjectTrial},
+             {"Moss trial 2", CxF3ObjectTrial}}) {
+        objects.push_back(CxF3Object::CreateCxFObject());
+        objects.back()->SetName(name);
+        objects.back()->SetObjectType(type);
+        EXPECT_TRUE(document->AddObject(objects.back())) << name;
+    }
+    const boost::shared_ptr<CxF3Object> unknown = CxF3Object::CreateCxFObject();
+    unknown->SetId("X9");
+    document->AddPalette("Greens and blues", {objects[2], objects[0]});
+    document->AddPalette("Sky", {objects[0], objects[1]});
+    document->AddPalette("Lost", {unknown});
+    document->AddPalette("Sky", {objects[1]});
+    document->AddPalette("Repeats", {objects[3], objects[3]});
+
+    // The jobs are added out of the order of their names.
+    const CXFTolerance de = NewTolerance(T_DE, 1.5f);
+    const CXFTolerance fmc = NewTolerance(T_FMC, 2.0f);
+    const boost::shared_ptr<CxF3Job> sky = NewJob("Sky approval");
+    sky->AddSerie("O1", "Sky approval", &de, "M1", {"O2"});
+    sky->AddSerie("O1", "Sky approval", nullptr, "", {});
+    document->AddOstraJob(sky);
+    const boost::shared_ptr<CxF3Job> moss = NewJob("Moss approval");
+    moss->AddSerie("O3", "Moss approval", &fmc, "M1", {"O4", "O5"});
+    document->AddOstraJob(moss);
+
+    EXPECT_TRUE(document->SaveCxF(ar_path.string()));
+    return ar_path.string();
+}
+
+const std::string k_branded_library = TESSARINE_SOURCE_DIR "/tests/data/lumivera_library.cxf";
+
+// The ids of the objects dump writes, from its CSV or its JSON.
+std::vector<std::string> CsvIds(const std::string &ar_csv) {
+    const std::vector<std::vector<std::string>> records = CsvRecords(ar_csv);
+    std::vector<std::string> ids;
+    for (std::size_t index = 1; index < records.size(); ++index)
+        ids.push_back(records[index].at(0));
+    return ids;
+}
+
+std::vector<std::string> JsonIds(const std::string &ar_json) {
+    std::vector<std::string> ids;
+    for (const auto &row : ParseJson(ar_json))
+        ids.push_back(row.second.get<std::string>("id"));
+    return ids;
+}
+
 // ---------------------------------------------------------------- command line
 
 TEST(Cxftool, HelpListsEveryCommand) {
@@ -131,6 +223,19 @@ TEST(Cxftool, DumpHelpNamesTheFormatsAndTheNumberForm) {
     EXPECT_NE(help.find("--format csv"), std::string::npos);
     EXPECT_NE(help.find("--format json"), std::string::npos);
     EXPECT_NE(help.find("shortest form"), std::string::npos);
+}
+
+TEST(Cxftool, DumpHelpNamesThePaletteOptionAndWhichOfNamesakesItTakes) {
+    const std::string help = Cxftool({"dump", "--help"}).out;
+    EXPECT_EQ(help.rfind("usage: cxftool dump FILE [--format csv|json] [--palette NAME]\n", 0), 0u) << help;
+    EXPECT_NE(help.find("\n  --palette NAME "), std::string::npos) << help;
+    EXPECT_NE(help.find("the first of them is taken"), std::string::npos) << help;
+}
+
+TEST(Cxftool, InfoHelpNamesPalettesJobsAndTheColourLibrary) {
+    const std::string help = Cxftool({"info", "--help"}).out;
+    for (const char *p_words : {"its palettes", "its jobs", "branded colour library", "--palette NAME"})
+        EXPECT_NE(help.find(p_words), std::string::npos) << p_words;
 }
 
 TEST(Cxftool, NoArgumentsPrintsTheUsageToStandardError) {
@@ -253,6 +358,7 @@ protected:
         const Result result = Cxftool({"example", s_example});
         ASSERT_EQ(result.code, 0) << result.err;
         ASSERT_EQ(result.out, "");
+        s_palettes = WritePalettesAndJobs(s_folder / "palettes.cxf");
     }
     static void TearDownTestSuite() {
         std::error_code ignored;
@@ -261,10 +367,13 @@ protected:
 
     static fs::path s_folder;
     static std::string s_example;
+    // See WritePalettesAndJobs.
+    static std::string s_palettes;
 };
 
 fs::path CxftoolFiles::s_folder;
 std::string CxftoolFiles::s_example;
+std::string CxftoolFiles::s_palettes;
 
 TEST_F(CxftoolFiles, ValidateAcceptsTheExample) {
     const Result result = Cxftool({"validate", s_example});
@@ -374,13 +483,62 @@ TEST_F(CxftoolFiles, InfoOfTheExampleCountsTheObjectsHoldingEachKindOfValue) {
     EXPECT_TRUE(HasLine(out, "ColorRecipe DeviceColorValues 1"));
 }
 
+TEST_F(CxftoolFiles, InfoOfTheExampleListsItsPalettesAndItsJob) {
+    const std::string out = Cxftool({"info", s_example}).out;
+    EXPECT_EQ(Section(out, "Palettes: 3"),
+              (std::vector<std::string>{"Palettes: 3", "Name Objects", "Targets 1", "Trials 1",
+                                        "Brick Red materials 2"}))
+        << out;
+    EXPECT_EQ(Section(out, "Jobs: 1"),
+              (std::vector<std::string>{"Jobs: 1", "Brick Red approval: 1 series",
+                                        "Reference Tolerance Specification Samples", "O1 CIELAB M1_D50_2 O2"}))
+        << out;
+    EXPECT_TRUE(HasLine(out, "Colour library: -")) << out;
+}
+
+// Palettes that share a name are listed apart; a palette none of whose
+// objects is in the file is not listed, nor is the group of all objects.
+TEST_F(CxftoolFiles, InfoListsPalettesInTheFileOrderWithTheirObjectCounts) {
+    const Result result = Cxftool({"info", s_palettes});
+    ASSERT_EQ(result.code, 0) << result.err;
+    EXPECT_EQ(Section(result.out, "Palettes: 4"),
+              (std::vector<std::string>{"Palettes: 4", "Name Objects", "Greens and blues 2", "Sky 2", "Sky 1",
+                                        "Repeats 2"}))
+        << result.out;
+}
+
+// The file keeps a job as sets named after it, so the jobs come back by
+// name; a series without tolerance or samples shows dashes.
+TEST_F(CxftoolFiles, InfoListsJobsByNameWithTheirSeries) {
+    const Result result = Cxftool({"info", s_palettes});
+    ASSERT_EQ(result.code, 0) << result.err;
+    EXPECT_EQ(Section(result.out, "Jobs: 2"),
+              (std::vector<std::string>{"Jobs: 2", "Moss approval: 1 series",
+                                        "Reference Tolerance Specification Samples", "O3 FMCII M1 O4, O5",
+                                        "Sky approval: 2 series", "Reference Tolerance Specification Samples",
+                                        "O1 CIELAB M1 O2", "O1 - - -"}))
+        << result.out;
+}
+
+TEST_F(CxftoolFiles, InfoNamesTheBrandedLibraryAndCountsItsColours) {
+    const Result result = Cxftool({"info", k_branded_library});
+    ASSERT_EQ(result.code, 0) << result.err;
+    EXPECT_EQ(result.err, "");
+    EXPECT_EQ(Section(result.out, "Colour library: Coastal Inks"),
+              (std::vector<std::string>{"Colour library: Coastal Inks", "Colours: 3"}))
+        << result.out;
+    EXPECT_TRUE(HasLine(result.out, "Palettes: 0"));
+    EXPECT_TRUE(HasLine(result.out, "Jobs: 0"));
+}
+
 TEST_F(CxftoolFiles, InfoOfAnEmptyDocumentSaysNone) {
     const std::string path = WriteTextFile(
         s_folder / "empty.cxf", "<cc:CxF xmlns:cc=\"http://colorexchangeformat.com/CxF3-core\"/>\n");
     const Result result = Cxftool({"info", path});
     EXPECT_EQ(result.code, 0) << result.err;
     for (const char *p_line :
-         {"Creator: -", "Created: -", "File tags: 0", "Objects: 0", "Colour specifications: 0", "Kinds of values: 0"})
+         {"Creator: -", "Created: -", "File tags: 0", "Objects: 0", "Colour specifications: 0", "Kinds of values: 0",
+          "Palettes: 0", "Jobs: 0", "Colour library: -"})
         EXPECT_TRUE(HasLine(result.out, p_line)) << p_line << "\n" << result.out;
 }
 
@@ -516,6 +674,74 @@ TEST_F(CxftoolFiles, DumpJsonOfAnEmptyDocumentIsAnEmptyArray) {
         s_folder / "empty.cxf", "<cc:CxF xmlns:cc=\"http://colorexchangeformat.com/CxF3-core\"/>\n");
     EXPECT_EQ(Cxftool({"dump", path, "--format", "json"}).out, "[]\n");
     EXPECT_EQ(Cxftool({"dump", path}).out, "id,name,type\n");
+}
+
+// ---------------------------------------------------------------- dump --palette
+
+TEST_F(CxftoolFiles, DumpPaletteCsvListsItsObjectsInPaletteOrder) {
+    const Result result = Cxftool({"dump", s_example, "--palette", "Brick Red materials"});
+    ASSERT_EQ(result.code, 0) << result.err;
+    EXPECT_EQ(result.err, "");
+    EXPECT_EQ(CsvIds(result.out), (std::vector<std::string>{"O4", "O3"}));
+    // The columns are those of the whole file, and so are the values.
+    const std::vector<std::vector<std::string>> records = CsvRecords(result.out);
+    const std::vector<std::vector<std::string>> all = CsvRecords(Cxftool({"dump", s_example}).out);
+    ASSERT_EQ(records.size(), 3u);
+    ASSERT_EQ(all.size(), 5u);
+    EXPECT_EQ(records[0], all[0]);
+    EXPECT_EQ(records[1], all[4]);
+    EXPECT_EQ(records[2], all[3]);
+
+    EXPECT_EQ(CsvIds(Cxftool({"dump", s_palettes, "--palette=Greens and blues"}).out),
+              (std::vector<std::string>{"O3", "O1"}));
+}
+
+TEST_F(CxftoolFiles, DumpPaletteJsonListsItsObjectsInPaletteOrder) {
+    const Result result = Cxftool({"dump", s_example, "--palette", "Brick Red materials", "--format", "json"});
+    ASSERT_EQ(result.code, 0) << result.err;
+    EXPECT_EQ(JsonIds(result.out), (std::vector<std::string>{"O4", "O3"}));
+    EXPECT_EQ(JsonIds(Cxftool({"dump", "--format=json", "--palette=Greens and blues", s_palettes}).out),
+              (std::vector<std::string>{"O3", "O1"}));
+}
+
+TEST_F(CxftoolFiles, DumpPaletteWritesAnObjectAsOftenAsThePaletteListsIt) {
+    EXPECT_EQ(CsvIds(Cxftool({"dump", s_palettes, "--palette", "Repeats"}).out),
+              (std::vector<std::string>{"O4", "O4"}));
+}
+
+TEST_F(CxftoolFiles, DumpPaletteTakesTheFirstOfPalettesThatShareAName) {
+    EXPECT_EQ(CsvIds(Cxftool({"dump", s_palettes, "--palette", "Sky"}).out), (std::vector<std::string>{"O1", "O2"}));
+    EXPECT_EQ(JsonIds(Cxftool({"dump", s_palettes, "--palette", "Sky", "--format", "json"}).out),
+              (std::vector<std::string>{"O1", "O2"}));
+}
+
+TEST_F(CxftoolFiles, DumpUnknownPaletteFailsAndNamesThePalettesThereAre) {
+    for (const std::string format : {"csv", "json"}) {
+        const Result result = Cxftool({"dump", s_palettes, "--palette", "Sk", "--format", format});
+        EXPECT_EQ(result.code, 1) << format;
+        EXPECT_EQ(result.out, "") << format;
+        EXPECT_EQ(result.err, "cxftool dump: no palette \"Sk\" in " + s_palettes +
+                                  "\nIts palettes: \"Greens and blues\", \"Sky\", \"Sky\", \"Repeats\"\n");
+    }
+}
+
+// The palette that is lost (its object is not in the file) and the group of
+// all objects, named by the file description, are not palettes.
+TEST_F(CxftoolFiles, DumpPaletteFindsNoPaletteInTheGroupOfAllObjectsOrALostPalette) {
+    for (const char *p_name : {"Sky and moss", "Lost"}) {
+        const Result result = Cxftool({"dump", s_palettes, "--palette", p_name});
+        EXPECT_EQ(result.code, 1) << p_name;
+        EXPECT_EQ(result.out, "") << p_name;
+        EXPECT_NE(result.err.find("no palette"), std::string::npos) << result.err;
+    }
+}
+
+TEST_F(CxftoolFiles, DumpPaletteOfAFileWithoutPalettesFails) {
+    const Result result = Cxftool({"dump", k_branded_library, "--palette", "Coastal Inks"});
+    EXPECT_EQ(result.code, 1);
+    EXPECT_EQ(result.out, "");
+    EXPECT_EQ(result.err,
+              "cxftool dump: no palette \"Coastal Inks\" in " + k_branded_library + "\nThe file has no palettes.\n");
 }
 
 // ---------------------------------------------------------------- corpus

@@ -13,7 +13,7 @@ namespace cxftool {
 
 // Exit codes.
 constexpr int k_exit_ok = 0;
-constexpr int k_exit_failure = 1; // the file could not be read, written or is invalid
+constexpr int k_exit_failure = 1; // the file could not be read or written, is invalid or lacks what was asked for
 constexpr int k_exit_usage = 2;   // the command line is wrong
 
 // The arguments of one command after parsing: its FILE and the options that
@@ -23,6 +23,7 @@ struct Arguments {
     std::map<std::string, std::string> options;
 
     std::string Option(const std::string &ar_name, const std::string &ar_fallback) const;
+    bool HasOption(const std::string &ar_name) const;
 };
 
 struct Command {

@@ -41,8 +41,9 @@ void WriteToolHelp(std::ostream &ar_out) {
         ar_out << "  " << p_command->name << std::string(width - p_command->name.size() + 2, ' ')
                << p_command->summary << "\n";
     ar_out << "\n"
-              "Exit codes: 0 success, 1 the file cannot be read or written or is invalid,\n"
-              "2 a wrong command line. Errors are written to standard error.\n";
+              "Exit codes: 0 success, 1 the file cannot be read or written, is invalid or\n"
+              "lacks what was asked for, 2 a wrong command line. Errors are written to\n"
+              "standard error.\n";
 }
 
 // The parse of a command's arguments: either help was asked for, or the
@@ -119,6 +120,8 @@ std::string Arguments::Option(const std::string &ar_name, const std::string &ar_
     const auto found = options.find(ar_name);
     return found == options.end() ? ar_fallback : found->second;
 }
+
+bool Arguments::HasOption(const std::string &ar_name) const { return options.count(ar_name) > 0; }
 
 int RunCxftool(const std::vector<std::string> &ar_args, std::ostream &ar_out, std::ostream &ar_err) {
     if (ar_args.empty()) {

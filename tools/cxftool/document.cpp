@@ -1,5 +1,10 @@
 #include "tools/cxftool/document.h"
 
+// The body of the document, for the branded library's name, which the
+// public CxF3LumiveraLibrary does not give.
+#include "dll/cxfwrapper/source/cxf3lumiverawrapper.h"
+#include "dll/cxfwrapper/source/cxf3wrapper.h"
+
 #include <lmx/lmxerror.h>
 
 namespace cxftool {
@@ -38,6 +43,24 @@ bool LoadFileOrComplain(const std::string &ar_command, const std::string &ar_pat
         return true;
     ar_err << "cxftool " << ar_command << ": cannot read " << ar_path << "\n" << error;
     return false;
+}
+
+std::vector<Palette> PalettesOf(const CxF3 &ar_document) {
+    std::vector<Palette> palettes = ar_document.GetPalettes();
+    // A document without objects gives no groups at all.
+    if (!palettes.empty())
+        palettes.erase(palettes.begin());
+    return palettes;
+}
+
+std::string BrandedLibraryName(const CxF3 &ar_document) {
+    const boost::shared_ptr<CxF3LumiveraLibraryImpl> &library = ar_document.GetWrapper().library;
+    if (!library)
+        return std::string();
+    // The const accessor gives null for a missing element instead of making one.
+    const c_Lumivera &branded = *library->document;
+    const c_LVLibrary *p_library = branded.get_LVLibrary();
+    return p_library ? Narrow(p_library->get_name()) : std::string();
 }
 
 std::string Narrow(const std::wstring &ar_text) {

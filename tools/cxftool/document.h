@@ -1,10 +1,12 @@
 // Reading a file for the commands.
 //
-// The document classes (CxF3 and its parts) answer for the objects and the
-// colour specifications. The file information (creator, date, description,
-// tags) and the kinds of values an object holds are not shown by those
-// classes, so the commands also read the file into the bound tree of
-// <cxf/v3/cxf3.h>; the same file is read twice.
+// The document classes (CxF3 and its parts) answer for the objects, the
+// colour specifications, the palettes, the jobs and the branded colour
+// library. The file information (creator, date, description, tags) and the
+// kinds of values an object holds are not shown by those classes, so the
+// commands also read the file into the bound tree of <cxf/v3/cxf3.h>; the
+// same file is read twice. The name of the branded library is read from the
+// document's body (BrandedLibraryName).
 #ifndef TESSARINE_TOOLS_CXFTOOL_DOCUMENT_H
 #define TESSARINE_TOOLS_CXFTOOL_DOCUMENT_H
 
@@ -16,6 +18,8 @@
 
 #include <ostream>
 #include <string>
+#include <utility>
+#include <vector>
 
 namespace cxftool {
 
@@ -32,6 +36,18 @@ bool LoadFile(const std::string &ar_path, LoadedFile &ar_file, std::string &ar_e
 // so on ar_err ("cxftool COMMAND: cannot read FILE" and the reason).
 bool LoadFileOrComplain(const std::string &ar_command, const std::string &ar_path, LoadedFile &ar_file,
                         std::ostream &ar_err);
+
+// A palette: its name and its objects, in its order.
+using Palette = std::pair<std::string, CxF3::ObjectList>;
+
+// The palettes of the document, in its order. CxF3::GetPalettes gives the
+// group of all objects first; that group is not a palette and is left out.
+// Palettes may share a name.
+std::vector<Palette> PalettesOf(const CxF3 &ar_document);
+
+// The name of the branded colour library the file carries; "" when it has
+// none, or when its library element or name is missing.
+std::string BrandedLibraryName(const CxF3 &ar_document);
 
 // UTF-8 text of the bound tree's UTF-16 strings.
 std::string Narrow(const std::wstring &ar_text);

@@ -1,5 +1,6 @@
-// cxftool dump FILE [--format csv|json]: one row per object with its Lab
-// values and reflectance under each colour specification of the file.
+// cxftool dump FILE [--format csv|json] [--palette NAME]: one row per object
+// (of the file, or of one palette) with its Lab values and reflectance under
+// each colour specification of the file.
 #include "tools/cxftool/commands.h"
 #include "tools/cxftool/document.h"
 #include "tools/cxftool/output.h"
@@ -108,6 +109,38 @@ void WriteJson(std::ostream &ar_out, const std::vector<std::string> &ar_specific
     ar_out << (ar_rows.empty() ? "]\n" : "\n]\n");
 }
 
+// The names of the palettes as JSON strings, for a message: "A", "B".
+std::string QuotedNames(const std::vector<Palette> &ar_palettes) {
+    std::string names;
+    for (const Palette &palette : ar_palettes)
+        names += (names.empty() ? "" : ", ") + JsonString(palette.first);
+    return names;
+}
+
+// The objects to dump: every object of the file, or with --palette those of
+// the first palette of that name, in the palette's order. False, with the
+// reason on ar_err, when the file has no palette of that name.
+bool ObjectsToDump(const Arguments &ar_args, CxF3 &ar_document, CxF3::ObjectList &ar_objects,
+                   std::ostream &ar_err) {
+    if (!ar_args.HasOption("--palette")) {
+        ar_objects = ar_document.GetObjects();
+        return true;
+    }
+    const std::string name = ar_args.Option("--palette", "");
+    const std::vector<Palette> palettes = PalettesOf(ar_document);
+    for (const Palette &palette : palettes)
+        if (palette.first == name) {
+            ar_objects = palette.second;
+            return true;
+        }
+    ar_err << "cxftool dump: no palette " << JsonString(name) << " in " << ar_args.file << "\n";
+    if (palettes.empty())
+        ar_err << "The file has no palettes.\n";
+    else
+        ar_err << "Its palettes: " << QuotedNames(palettes) << "\n";
+    return false;
+}
+
 int RunDump(const Arguments &ar_args, std::ostream &ar_out, std::ostream &ar_err) {
     const std::string format = ar_args.Option("--format", "csv");
     if (format != "csv" && format != "json") {
@@ -122,8 +155,11 @@ int RunDump(const Arguments &ar_args, std::ostream &ar_out, std::ostream &ar_err
     std::vector<std::string> specification_ids;
     for (const boost::shared_ptr<CxF3ColorSpecification> &specification : specifications)
         specification_ids.push_back(specification->GetId());
+    CxF3::ObjectList objects;
+    if (!ObjectsToDump(ar_args, *file.document, objects, ar_err))
+        return k_exit_failure;
     std::vector<ObjectRow> rows;
-    for (const boost::shared_ptr<CxF3Object> &object : file.document->GetObjects())
+    for (const boost::shared_ptr<CxF3Object> &object : objects)
         rows.push_back(RowOf(*object, specifications));
 
     if (format == "csv")
@@ -139,7 +175,7 @@ const Command &DumpCommand() {
     static const Command command{
         "dump",
         "list the objects of FILE with Lab and reflectance, as CSV or JSON",
-        "usage: cxftool dump FILE [--format csv|json]\n"
+        "usage: cxftool dump FILE [--format csv|json] [--palette NAME]\n"
         "\n"
         "Writes one row per object: id, name, object type (as the file names it),\n"
         "then for each colour specification SPEC of the file, in the file's order:\n"
@@ -158,10 +194,16 @@ const Command &DumpCommand() {
         "  --format json  an array with one element per object:\n"
         "                 {\"id\", \"name\", \"type\", \"specifications\": {SPEC:\n"
         "                 {\"lab\": [L, a, b], \"reflectance\": [36 values]}}}.\n"
+        "  --palette NAME only the objects of the palette NAME, in the palette's\n"
+        "                 order; an object the palette lists twice is written\n"
+        "                 twice. The name must match exactly; when palettes share\n"
+        "                 the name, the first of them is taken. 'cxftool info'\n"
+        "                 lists the palettes. A name that no palette has is an\n"
+        "                 error (exit code 1). The columns stay those of the file.\n"
         "\n"
         "Numbers are written in the shortest form that reads back as the same\n"
         "double (e.g. 0.1, 42, 1e-07). Text is UTF-8.\n",
-        {"--format"},
+        {"--format", "--palette"},
         RunDump};
     return command;
 }

@@ -1,7 +1,7 @@
 // cxftool example FILE: writes a small CxF3 file built through the document
-// classes: four paint swatches measured under two conditions. It is the
-// bundled examples/swatches.cxf, and a short tour of the writing side of
-// the classes.
+// classes: four paint swatches measured under two conditions, three palettes
+// of them and the job that approves the trial. It is the bundled
+// examples/swatches.cxf, and a short tour of the writing side of the classes.
 //
 // The swatches are made up: the spectra are smooth curves of the right
 // shape, and the Lab values are typical of such colours rather than
@@ -76,14 +76,21 @@ boost::shared_ptr<CxF3ColorRecipe> BrickRedRecipe(const std::string &ar_specific
     return recipe;
 }
 
+// AddObject numbers the objects in the order they are added: the target
+// is O1, the trial O2, the card O3 and the colorant O4.
+const char *const k_target_id = "O1";
+const char *const k_trial_id = "O2";
+const char *const k_card_id = "O3";
+const char *const k_colorant_id = "O4";
+
 // Each Add... below adds one swatch with the values it is measured with;
 // false when the classes refuse one of them.
 
 bool AddTarget(CxF3 &ar_document, const std::string &ar_m1, const std::string &ar_m2) {
     Handle target = NewObject(CxF3ObjectTarget, "Brick Red", "The colour the customer approved");
     // The tolerance names its standard by the object's id, which AddObject
-    // gives only later: the target is the first object, so it becomes O1.
-    target->SetId("O1");
+    // gives only later.
+    target->SetId(k_target_id);
     CXFTolerance tolerance;
     tolerance.SetToleranceModus(T_CMC);
     tolerance.SetV(1.0f, 2.0f, 1.0f, 0.0f, 0.0f, 0.0f);
@@ -120,6 +127,30 @@ bool AddColorant(CxF3 &ar_document, const std::string &ar_m1) {
            ar_document.AddObject(colorant);
 }
 
+// "Targets" and "Trials" sort the swatches by type; "Brick Red materials"
+// lists the colorant before the card, against the order of the file.
+void AddPalettes(CxF3 &ar_document) {
+    const CxF3::ObjectList &objects = ar_document.GetObjects();
+    ar_document.AddStandardPalette(objects);
+    ar_document.AddTrialPalette(objects);
+    ar_document.AddPalette("Brick Red materials",
+                           {ar_document.GetObjectById(k_colorant_id), ar_document.GetObjectById(k_card_id)});
+}
+
+// The trial judged against the target under M1, within a CIELAB dE of 2. A
+// file keeps no name of a job apart from its series' set name, so both are
+// the same. (A CMC limit would read back without its chroma weight.)
+void AddApprovalJob(CxF3 &ar_document, const std::string &ar_m1) {
+    const std::string name = "Brick Red approval";
+    const boost::shared_ptr<CxF3Job> job = CxF3Job::CreateCxFJob();
+    job->SetName(name);
+    CXFTolerance tolerance;
+    tolerance.SetToleranceModus(T_DE);
+    tolerance.SetV0(2.0f);
+    job->AddSerie(k_target_id, name, &tolerance, ar_m1, {k_trial_id});
+    ar_document.AddOstraJob(job);
+}
+
 int RunExample(const Arguments &ar_args, std::ostream & /*ar_out*/, std::ostream &ar_err) {
     const boost::shared_ptr<CxF3> document = CxF3::CreateCxF();
     document->SetCreator("Tessarine cxftool");
@@ -134,6 +165,8 @@ int RunExample(const Arguments &ar_args, std::ostream & /*ar_out*/, std::ostream
         ar_err << "cxftool example: the document classes refused a swatch\n";
         return k_exit_failure;
     }
+    AddPalettes(*document);
+    AddApprovalJob(*document, m1);
     if (!document->SaveCxF(ar_args.file)) {
         ar_err << "cxftool example: cannot write " << ar_args.file << "\n";
         return k_exit_failure;
@@ -153,8 +186,11 @@ const Command &ExampleCommand() {
         "and a CMC 2:1 tolerance, a trial, a brightened white card (substrate) and a\n"
         "colorant. They carry 36-point reflectance spectra from 380 nm and Lab values\n"
         "under two colour specifications, M1_D50_2 and M2_D65_10, with tags and\n"
-        "file tags. The objects are numbered O1 to O4; the file gets the time of\n"
-        "writing as its creation date. A FILE without an extension gets \".cxf\".\n"
+        "file tags. The objects are numbered O1 to O4. Three palettes group them:\n"
+        "\"Targets\" (O1), \"Trials\" (O2) and \"Brick Red materials\" (O4, O3); a job,\n"
+        "\"Brick Red approval\", judges the trial against the target under M1_D50_2\n"
+        "within a CIELAB dE of 2. The file gets the time of writing as its creation\n"
+        "date. A FILE without an extension gets \".cxf\".\n"
         "Prints nothing on success.\n",
         {},
         RunExample};

@@ -177,6 +177,61 @@ void WriteValueKinds(std::ostream &ar_out, const cc::CxF &ar_tree) {
     WriteTable(ar_out, rows, "  ");
 }
 
+void WritePalettes(std::ostream &ar_out, const CxF3 &ar_document) {
+    const std::vector<Palette> palettes = PalettesOf(ar_document);
+    ar_out << "Palettes: " << palettes.size() << "\n";
+    if (palettes.empty())
+        return;
+    std::vector<TableRow> rows = {{"Name", "Objects"}};
+    for (const Palette &palette : palettes)
+        rows.push_back({TableText(palette.first), std::to_string(palette.second.size())});
+    WriteTable(ar_out, rows, "  ");
+}
+
+// Ids joined by ", "; "-" when there are none.
+std::string IdList(const std::vector<std::string> &ar_ids) {
+    std::string list;
+    for (const std::string &id : ar_ids)
+        list += (list.empty() ? "" : ", ") + TableText(id);
+    return list.empty() ? k_absent : list;
+}
+
+// One row per series. A series names a colour specification only through
+// its tolerance, so a series without one shows "-" for both (the tolerance
+// the classes give for it is a default, not the file's).
+std::vector<TableRow> SeriesRows(CxF3Job &ar_job) {
+    std::vector<TableRow> rows = {{"Reference", "Tolerance", "Specification", "Samples"}};
+    for (unsigned index = 0; index < ar_job.GetSeriesCount(); ++index) {
+        const std::string specification = ar_job.GetColorSpecification(index);
+        const bool has_tolerance = !specification.empty();
+        rows.push_back({OrAbsent(ar_job.GetReferenceId(index)),
+                        has_tolerance ? TableText(ar_job.GetTolerance(index).GetString()) : k_absent,
+                        has_tolerance ? TableText(specification) : k_absent, IdList(ar_job.GetSampleIds(index))});
+    }
+    return rows;
+}
+
+void WriteJobs(std::ostream &ar_out, const CxF3 &ar_document) {
+    const std::vector<boost::shared_ptr<CxF3Job>> jobs = ar_document.GetJobs();
+    ar_out << "Jobs: " << jobs.size() << "\n";
+    for (const boost::shared_ptr<CxF3Job> &job : jobs) {
+        ar_out << "  " << TableText(job->GetName()) << ": " << job->GetSeriesCount() << " series\n";
+        if (job->GetSeriesCount() > 0)
+            WriteTable(ar_out, SeriesRows(*job), "    ");
+    }
+}
+
+// "-" when the file carries no library; a library without a name shows "".
+void WriteBrandedLibrary(std::ostream &ar_out, const CxF3 &ar_document) {
+    const boost::shared_ptr<CxF3LumiveraLibrary> library = ar_document.GetLumiveraLibrary();
+    if (!library) {
+        ar_out << "Colour library: " << k_absent << "\n";
+        return;
+    }
+    ar_out << "Colour library: " << TableText(BrandedLibraryName(ar_document)) << "\n"
+           << "  Colours: " << library->GetColors().size() << "\n";
+}
+
 int RunInfo(const Arguments &ar_args, std::ostream &ar_out, std::ostream &ar_err) {
     LoadedFile file;
     if (!LoadFileOrComplain("info", ar_args.file, file, ar_err))
@@ -185,6 +240,9 @@ int RunInfo(const Arguments &ar_args, std::ostream &ar_out, std::ostream &ar_err
     WriteObjectTypes(ar_out, *file.document);
     WriteColorSpecifications(ar_out, *file.document);
     WriteValueKinds(ar_out, file.tree);
+    WritePalettes(ar_out, *file.document);
+    WriteJobs(ar_out, *file.document);
+    WriteBrandedLibrary(ar_out, *file.document);
     return k_exit_ok;
 }
 
@@ -193,7 +251,7 @@ int RunInfo(const Arguments &ar_args, std::ostream &ar_out, std::ostream &ar_err
 const Command &InfoCommand() {
     static const Command command{
         "info",
-        "describe FILE: file information, objects, colour specifications",
+        "describe FILE: objects, specifications, palettes, jobs, library",
         "usage: cxftool info FILE\n"
         "\n"
         "Describes a CxF3 file:\n"
@@ -204,7 +262,18 @@ const Command &InfoCommand() {
         "    measurement that has none, such as an emissive one), illuminant,\n"
         "    observer and wavelength range;\n"
         "  - each kind of value the objects hold (ReflectanceSpectrum, ColorCIELab,\n"
-        "    DeltaCIELab, ColorRecipe, ...), with the number of objects holding it.\n"
+        "    DeltaCIELab, ColorRecipe, ...), with the number of objects holding it;\n"
+        "  - its palettes, in the file's order: name and number of objects (a\n"
+        "    palette none of whose objects is in the file is not listed); palettes\n"
+        "    may share a name. 'cxftool dump FILE --palette NAME' lists the objects\n"
+        "    of one;\n"
+        "  - its jobs: for each, its series with the reference object's id, the\n"
+        "    tolerance, the colour specification it is judged under and the ids of\n"
+        "    the samples (\"-\" for a series without tolerance or samples). A file\n"
+        "    keeps a job as quality control sets, one per series, named after the\n"
+        "    job: jobs read back one per set name, sorted by name;\n"
+        "  - the branded colour library it carries: its name and number of colours\n"
+        "    (\"-\" when it carries none).\n"
         "\"-\" stands for a value the file does not give. Text that is empty, has a\n"
         "space at an edge or holds a control character is shown as a JSON string\n"
         "(\"\", \" padded\", \"two\\nlines\"), so that each entry keeps to its line.\n",

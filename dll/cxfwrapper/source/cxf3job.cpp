@@ -4,6 +4,7 @@
 #include "cxf3jobwrapper.h"
 
 #include "cxf3text.h"
+#include "cxf3tolerancelabels.h"
 #include "cxf3wrapper.h"
 
 #include <cstddef>
@@ -56,25 +57,6 @@ void SetCIELabBox(qc::c_CIELabTolerances &ar_lab, const CXFTolerance &ar_toleran
     }
 }
 
-// The labels of the modes kept as custom tolerances: one for a limit, three
-// for a box; none for the other modes.
-std::vector<const wchar_t *> CustomLabels(CXFToleranceModusType a_mode) {
-    switch (a_mode) {
-    case T_FMC:
-        return {L"dE_FMC"};
-    case T_DEMG:
-        return {L"dEmg"};
-    case T_D:
-        return {L"dDensity"};
-    case T_LABMG:
-        return {L"dLmg", L"damg", L"dbmg"};
-    case T_LCHmg_Elliptical:
-        return {L"dLmg", L"dCmg", L"dHmg"};
-    default:
-        return {};
-    }
-}
-
 // A custom limit runs from 0 to the limit, which is V0 except for the
 // density limit, kept in V4.
 void SetCustomLimit(qc::c_CustomRangeToleranceType &ar_tol, const CXFTolerance &ar_tolerance) {
@@ -83,7 +65,7 @@ void SetCustomLimit(qc::c_CustomRangeToleranceType &ar_tol, const CXFTolerance &
 }
 
 void SetCustomTolerances(qc::c_CustomTolerances &ar_custom, const CXFTolerance &ar_tolerance) {
-    const std::vector<const wchar_t *> labels = CustomLabels(ar_tolerance.GetToleranceModus());
+    const std::vector<const wchar_t *> labels = CustomToleranceLabels(ar_tolerance.GetToleranceModus());
     for (std::size_t index = 0; index < labels.size(); ++index) {
         qc::c_CustomRangeToleranceType &r_tol = ar_custom.append_Tol();
         r_tol.set_Label(labels[index]);

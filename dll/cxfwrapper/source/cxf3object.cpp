@@ -4,6 +4,7 @@
 
 #include "cxf3colorrecipewrapper.h"
 #include "cxf3text.h"
+#include "cxf3tolerancelabels.h"
 
 #include <lmx/lmxtypes.h>
 
@@ -529,25 +530,6 @@ std::string CxF3Object::GetTag(const std::string &ar_collection, const std::stri
 
 namespace {
 
-// The labels of the modes stored as a cc:DeltaCustom, one per value; none
-// for the modes stored as a cc:DeltaCIELab.
-std::vector<const wchar_t *> CustomDeltaLabels(CXFToleranceModusType a_mode) {
-    switch (a_mode) {
-    case T_FMC:
-        return {L"dE_FMC"};
-    case T_DEMG:
-        return {L"dEmg"};
-    case T_D:
-        return {L"dDensity"};
-    case T_LABMG:
-        return {L"dLmg", L"damg", L"dbmg"};
-    case T_LCHmg_Elliptical:
-        return {L"dLmg", L"dCmg", L"dHmg"};
-    default:
-        return {};
-    }
-}
-
 // The value of the a_index-th custom delta. The density limit is kept in V4.
 double CustomDeltaValue(const CXFTolerance &ar_tolerance, std::size_t a_index) {
     return ar_tolerance.GetToleranceModus() == T_D ? ar_tolerance[4]
@@ -600,7 +582,7 @@ void SetDeltaReferences(Delta &ar_delta, const std::string &ar_name, const std::
 // unknown or the element lacks a required part.
 bool ToleranceAsDifference(const CXFTolerance &ar_tolerance, const std::wstring &ar_specification_id,
                            const std::wstring &ar_standard_id, cc::inner_ColorDifferenceValues &ar_item) {
-    const std::vector<const wchar_t *> labels = CustomDeltaLabels(ar_tolerance.GetToleranceModus());
+    const std::vector<const wchar_t *> labels = CustomToleranceLabels(ar_tolerance.GetToleranceModus());
     if (!labels.empty()) {
         cc::DeltaCustom &r_delta = ar_item.get_DeltaCustom();
         // Custom deltas are named by the mode's keyword, which is what reading
