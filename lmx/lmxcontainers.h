@@ -15,6 +15,8 @@
 #include <utility>
 #include <vector>
 
+#include "lmxpool.h"
+
 namespace lmx {
 
 // ---------------------------------------------------------------- deleter policies
@@ -402,12 +404,16 @@ public:
     void swap(ct_complex_single &ar_other) { ct_complex_optional<T, D>::swap(ar_other); }
 };
 
-// A repeated child: owned objects in document order.
+// A repeated child: owned objects in document order. Most such runs are short
+// (one or two items), so their vectors of pointers come from the pool, as
+// does the container itself when a choice holds a run as its alternative.
 template <typename T, typename D = ct_grin_ptr_deleter<T>>
-class ct_complex_multi : public ct_clonable_container<T, std::vector<T *>, D> {
-    typedef ct_clonable_container<T, std::vector<T *>, D> t_base;
+class ct_complex_multi : public ct_clonable_container<T, std::vector<T *, ct_pool_allocator<T *>>, D> {
+    typedef ct_clonable_container<T, std::vector<T *, ct_pool_allocator<T *>>, D> t_base;
 
 public:
+    LMX_POOLED_OBJECT
+
     // Adds a default object at the end and gives it.
     T &append() {
         this->push_back(new T());

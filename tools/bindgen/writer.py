@@ -136,6 +136,8 @@ class Generator:
                 '    %s &operator=(const %s &ar_other);' % (c.name, c.name),
                 '    virtual %s *clone() const;' % c.name,
                 '    virtual ~%s();' % c.name,
+                '    // Objects come from the pool of small blocks.',
+                '    LMX_POOLED_OBJECT',
                 '',
                 '    void init();',
                 '    void reset();',
