@@ -4,7 +4,11 @@
 
 #include <tessarine/tessarine.h>
 
-#include <cmath>
+#include <cxf/v3/cxf3.h>
+#include <cxf/v3/cxf3_colorpage.h>
+#include <cxf/v3/cxf3_qualitycontrol.h>
+
+#include "dll/cxfwrapper/source/cxf3wrapper.h"
 
 namespace {
 
@@ -237,4 +241,62 @@ TEST_F(CxF3EndToEndTest, SavedFileSurvivesASecondRoundUnchanged) {
     ASSERT_NE(custom, std::string::npos);
     second.erase(custom, empty_custom_resources.size());
     EXPECT_TRUE(first == second);
+}
+
+namespace {
+
+template <typename T> std::string Marshalled(const T &ar_document) {
+    std::string text;
+    EXPECT_EQ(ar_document.marshal(text), lmx::elmx_ok);
+    return text;
+}
+
+// The captured text of each custom resource entry of a file read through the binding.
+std::vector<std::string> CustomResourceTexts(const std::string &ar_path) {
+    cc::CxF tree;
+    EXPECT_EQ(tree.loadFile(ar_path.c_str()), lmx::elmx_ok);
+    std::vector<std::string> texts;
+    const cc::CustomResources &resources = tree.get_CustomResources();
+    for (std::size_t index = 0; index < resources.size_inner_CustomResources(); ++index) {
+        std::string text;
+        resources.get_inner_CustomResources(index).get_any(nullptr, nullptr, text);
+        texts.push_back(text);
+    }
+    return texts;
+}
+
+} // namespace
+
+TEST_F(CxF3EndToEndTest, PalettesAndJobsReadBackThroughTheBindingAndCompare) {
+    boost::shared_ptr<CxF3> document = CxF3::CreateCxF();
+    Build(*document);
+    document->AddStandardPalette(document->GetObjects());
+    document->AddTrialPalette(document->GetObjects());
+    document->AddPalette("Firsts", {document->GetObjectById("O3"), document->GetObjectById("O1")});
+    boost::shared_ptr<CxF3Job> job = CxF3Job::CreateCxFJob();
+    job->SetName("Approval");
+    const CXFTolerance tolerance = ToleranceOfMode(T_DE2000);
+    job->AddSerie("O1", "Approval", &tolerance, "lab-d65", {"O2"});
+    document->AddOstraJob(job);
+    ASSERT_TRUE(document->SaveCxF(PathOf("extensions.cxf")));
+
+    const std::vector<std::string> texts = CustomResourceTexts(PathOf("extensions.cxf"));
+    ASSERT_EQ(texts.size(), 2u);
+    cp::ColorPage page;
+    ASSERT_EQ(page.unmarshal(texts[0].data(), texts[0].size()), lmx::elmx_ok);
+    EXPECT_EQ(Marshalled(page), Marshalled(*document->GetWrapper().colorPage));
+    qc::c_QualityControl quality;
+    ASSERT_EQ(quality.unmarshal(texts[1].data(), texts[1].size()), lmx::elmx_ok);
+    EXPECT_EQ(Marshalled(quality), Marshalled(*document->GetWrapper().qualityControl));
+
+    boost::shared_ptr<CxF3> loaded = CxF3::CreateCxF();
+    ASSERT_TRUE(loaded->LoadCxF(PathOf("extensions.cxf")));
+    std::vector<std::string> names;
+    for (const auto &group : loaded->GetPalettes())
+        names.push_back(group.first + ":" + std::to_string(group.second.size()));
+    EXPECT_EQ(names, (std::vector<std::string>{"Every kind of value:11", "Targets:6", "Trials:1", "Firsts:2"}));
+    ASSERT_EQ(loaded->GetJobs().size(), 1u);
+    EXPECT_EQ(loaded->GetJobs()[0]->GetName(), "Approval");
+    EXPECT_EQ(loaded->GetJobs()[0]->GetSampleIds(0), std::vector<std::string>{"O2"});
+    EXPECT_EQ(loaded->GetJobs()[0]->GetTolerance(0).GetToleranceModus(), T_DE2000);
 }
