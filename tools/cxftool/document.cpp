@@ -1,8 +1,9 @@
 #include "tools/cxftool/document.h"
 
-// The body of the document, for the branded library's name, which the
-// public CxF3LumiveraLibrary does not give.
+// The body of the document, for its bound tree and for the branded
+// library's name, which the public classes do not give.
 #include "dll/cxfwrapper/source/cxf3lumiverawrapper.h"
+#include "dll/cxfwrapper/source/cxf3text.h"
 #include "dll/cxfwrapper/source/cxf3wrapper.h"
 
 #include <lmx/lmxerror.h>
@@ -22,18 +23,15 @@ std::string ErrorReport(lmx::elmx_error a_code, const lmx::s_debug_error &ar_deb
 } // namespace
 
 bool LoadFile(const std::string &ar_path, LoadedFile &ar_file, std::string &ar_error) {
-    lmx::s_debug_error debug;
-    const lmx::elmx_error code = ar_file.tree.unmarshal(ar_path.c_str(), &debug);
-    if (code != lmx::elmx_ok) {
-        ar_error = ErrorReport(code, debug);
-        return false;
-    }
     ar_file.document = CxF3::CreateCxF();
-    if (!ar_file.document->LoadCxF(ar_path)) {
-        ar_error = "The document classes could not read the file.\n";
-        return false;
-    }
-    return true;
+    if (ar_file.document->LoadCxF(ar_path))
+        return true;
+    // The document says only that it failed; the binding says where.
+    cc::CxF tree;
+    lmx::s_debug_error debug;
+    const lmx::elmx_error code = tree.unmarshal(ar_path.c_str(), &debug);
+    ar_error = code != lmx::elmx_ok ? ErrorReport(code, debug) : "The document classes could not read the file.\n";
+    return false;
 }
 
 bool LoadFileOrComplain(const std::string &ar_command, const std::string &ar_path, LoadedFile &ar_file,
@@ -60,13 +58,9 @@ std::string BrandedLibraryName(const CxF3 &ar_document) {
     // The const accessor gives null for a missing element instead of making one.
     const c_Lumivera &branded = *library->document;
     const c_LVLibrary *p_library = branded.get_LVLibrary();
-    return p_library ? Narrow(p_library->get_name()) : std::string();
+    return p_library ? ToNarrow(p_library->get_name()) : std::string();
 }
 
-std::string Narrow(const std::wstring &ar_text) {
-    std::string text;
-    lmx::convert(text, ar_text);
-    return text;
-}
+const cc::CxF &BoundTree(const CxF3 &ar_document) { return *ar_document.GetWrapper().root; }
 
 } // namespace cxftool

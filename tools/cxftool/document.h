@@ -4,9 +4,9 @@
 // colour specifications, the palettes, the jobs and the branded colour
 // library. The file information (creator, date, description, tags) and the
 // kinds of values an object holds are not shown by those classes, so the
-// commands also read the file into the bound tree of <cxf/v3/cxf3.h>; the
-// same file is read twice. The name of the branded library is read from the
-// document's body (BrandedLibraryName).
+// commands also look into the bound tree of <cxf/v3/cxf3.h> that the
+// document holds (BoundTree). The name of the branded library is read from
+// the document's body too (BrandedLibraryName).
 #ifndef TESSARINE_TOOLS_CXFTOOL_DOCUMENT_H
 #define TESSARINE_TOOLS_CXFTOOL_DOCUMENT_H
 
@@ -25,12 +25,11 @@ namespace cxftool {
 
 struct LoadedFile {
     boost::shared_ptr<CxF3> document;
-    cc::CxF tree;
 };
 
-// Reads the file both ways. False when either cannot read it, with the
-// reason in ar_error: the runtime's report (code, item, XML line) when the
-// XML does not bind.
+// Reads the file into a document. False when it cannot, with the reason in
+// ar_error: the runtime's report (code, item, XML line), for which the file
+// is read once more, through the binding alone.
 bool LoadFile(const std::string &ar_path, LoadedFile &ar_file, std::string &ar_error);
 // LoadFile for a command that needs the file: when it cannot be read, says
 // so on ar_err ("cxftool COMMAND: cannot read FILE" and the reason).
@@ -49,8 +48,8 @@ std::vector<Palette> PalettesOf(const CxF3 &ar_document);
 // none, or when its library element or name is missing.
 std::string BrandedLibraryName(const CxF3 &ar_document);
 
-// UTF-8 text of the bound tree's UTF-16 strings.
-std::string Narrow(const std::wstring &ar_text);
+// The bound tree the document was read into.
+const cc::CxF &BoundTree(const CxF3 &ar_document);
 
 } // namespace cxftool
 

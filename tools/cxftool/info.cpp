@@ -3,6 +3,8 @@
 #include "tools/cxftool/document.h"
 #include "tools/cxftool/output.h"
 
+#include "dll/cxfwrapper/source/cxf3text.h"
+
 #include <iterator>
 #include <map>
 #include <set>
@@ -85,23 +87,23 @@ void CountInOrder(std::vector<std::pair<std::string, int>> &ar_counts, const std
 std::string OrAbsent(const std::string &ar_text) { return ar_text.empty() ? k_absent : TableText(ar_text); }
 
 void WriteFileInformation(std::ostream &ar_out, const LoadedFile &ar_file, const std::string &ar_path) {
-    const cc::FileInformation *p_information = ar_file.tree.get_FileInformation();
+    const cc::FileInformation *p_information = BoundTree(*ar_file.document).get_FileInformation();
     const cc::FileInformation empty;
     const cc::FileInformation &information = p_information ? *p_information : empty;
     const std::string created =
         information.isset_CreationDate() ? information.get_CreationDate().get_as_string() : std::string();
     WriteTable(ar_out,
                {{"File:", ar_path},
-                {"Creator:", OrAbsent(Narrow(information.get_Creator()))},
+                {"Creator:", OrAbsent(ToNarrow(information.get_Creator()))},
                 {"Created:", OrAbsent(created)},
-                {"Description:", OrAbsent(Narrow(information.get_Description()))},
-                {"Comment:", OrAbsent(Narrow(information.get_Comment()))}},
+                {"Description:", OrAbsent(ToNarrow(information.get_Description()))},
+                {"Comment:", OrAbsent(ToNarrow(information.get_Comment()))}},
                "");
     ar_out << "File tags: " << information.size_Tag() << "\n";
     std::vector<TableRow> tags;
     for (std::size_t index = 0; index < information.size_Tag(); ++index)
-        tags.push_back({TableText(Narrow(information.get_Tag(index).get_Name())),
-                        TableText(Narrow(information.get_Tag(index).get_Value()))});
+        tags.push_back({TableText(ToNarrow(information.get_Tag(index).get_Name())),
+                        TableText(ToNarrow(information.get_Tag(index).get_Value()))});
     WriteTable(ar_out, tags, "  ");
 }
 
@@ -239,7 +241,7 @@ int RunInfo(const Arguments &ar_args, std::ostream &ar_out, std::ostream &ar_err
     WriteFileInformation(ar_out, file, ar_args.file);
     WriteObjectTypes(ar_out, *file.document);
     WriteColorSpecifications(ar_out, *file.document);
-    WriteValueKinds(ar_out, file.tree);
+    WriteValueKinds(ar_out, BoundTree(*file.document));
     WritePalettes(ar_out, *file.document);
     WriteJobs(ar_out, *file.document);
     WriteBrandedLibrary(ar_out, *file.document);
